@@ -1,0 +1,52 @@
+// Conversions between Variant types with the original runtime's rules: locale-aware parsing of
+// numeric text, half-even rounding into integer and Currency targets, error 6 on overflow, 13 on a
+// type that cannot convert and 94 for Null.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+#include "runtime/variant.h"
+
+namespace xal {
+
+// ---- Coercions (one per target type) ------------------------------------------------------------
+std::string CStr(const Variant& v);  // Double: 15 significant digits; Boolean "True"/"False"
+double CDbl(const Variant& v);
+int32_t CLng(const Variant& v);      // half-even; error 6 outside the 32-bit range
+int16_t CInt(const Variant& v);      // half-even; error 6 outside the 16-bit range
+Currency CCur(const Variant& v);     // half-even at the fourth decimal
+Date CDate(const Variant& v);        // numbers are serials; text is parsed as a date
+bool CBool(const Variant& v);        // numbers: non-zero; text "True"/"False" or numeric text
+
+// Int = floor, Fix = toward zero; both keep the type of their argument (Double stays Double,
+// Currency stays Currency, Date stays Date); Null gives Null; numeric text becomes Double.
+Variant Int(const Variant& v);
+Variant Fix(const Variant& v);
+
+// ---- Numbers and text ---------------------------------------------------------------------------
+// Parses numeric text with the locale's separators: white space around, sign in front or behind,
+// parentheses for negative, thousands separators in the integer digits, one decimal separator,
+// exponent, &H/&O prefixes; all of it must be consumed, otherwise error 13.
+double ParseNumber(std::string_view text);
+// True when ParseNumber would accept the text (IsNumeric on text).
+bool IsNumericText(std::string_view text);
+// Val: leading number of the text, "." always, blanks inside ignored, 0 when none.
+double Val(std::string_view text);
+
+// The text CStr gives for a Double: at most 15 significant digits, trailing zeros removed, fixed
+// notation unless the number needs an exponent, "E+dd"/"E-dd" otherwise; the locale's decimal.
+std::string DoubleToString(double value);
+// The exact value with up to 4 decimals, trailing zeros dropped; the locale's decimal.
+std::string CurrencyToString(Currency value);
+// Str(): like CStr but "." always and a leading blank for non-negative numbers.
+std::string Str(const Variant& v);
+
+// ---- Rounding -----------------------------------------------------------------------------------
+// Round to nearest, ties to even, on the binary value (CInt/CLng rule); no range check.
+double RoundHalfEven(double x);
+// Round(x, n): x × 10^n computed in double, rounded half to even, divided by 10^n.
+double VbRound(double x, int decimals);
+
+}  // namespace xal
