@@ -43,6 +43,16 @@ std::string CurrencyToString(Currency value);
 // Str(): like CStr but "." always and a leading blank for non-negative numbers.
 std::string Str(const Variant& v);
 
+// The digits CStr shows for a number, before any separator is placed: value = 0.digits × 10^point.
+// Zero has no digits. Format rounds on these digits rather than on the binary value.
+struct DecimalDigits {
+  bool negative = false;
+  std::string digits;  // significant digits, no leading or trailing zeros
+  int32_t point = 0;   // digits before the decimal point (may be ≤ 0 or beyond the digits)
+};
+DecimalDigits DoubleDigits(double value);      // at most 15 significant digits, as CStr
+DecimalDigits CurrencyDigits(Currency value);  // exact
+
 // ---- Rounding -----------------------------------------------------------------------------------
 // Round to nearest, ties to even, on the binary value (CInt/CLng rule); no range check.
 double RoundHalfEven(double x);

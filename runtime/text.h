@@ -60,6 +60,8 @@ std::string String(int32_t n, std::string_view ch);  // n copies of ch's first c
 // Characters by code: Chr for 0-255 (the Windows-1252 page), ChrW/AscW for code points.
 std::string ChrW(int32_t code);
 int32_t AscW(std::string_view s);  // error 5 for ""
+std::string Chr(int32_t code);     // error 5 outside 0-255
+int32_t Asc(std::string_view s);   // Windows-1252 code of the first character, '?' if it has none
 
 // StrComp: -1, 0, 1. Binary orders by code point; Text compares case-insensitively (ICU
 // collation at secondary strength, so accents count and letter case does not).
