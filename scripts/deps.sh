@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Installs the Debian packages the build needs, only those that are missing.
 set -euo pipefail
-need=(cmake ninja-build g++ pkg-config libicu-dev libgtest-dev libgmock-dev libbenchmark-dev nlohmann-json3-dev)
+need=(cmake ninja-build g++ pkg-config libicu-dev libgtest-dev libgmock-dev libbenchmark-dev nlohmann-json3-dev libsqlite3-dev)
 [ "${XAL_WITH_CLANG:-0}" = 1 ] && need+=(clang libclang-rt-14-dev)
 missing=()
 for p in "${need[@]}"; do

@@ -1,0 +1,334 @@
+// HostConnection and HostServer over SQLite.
+#include "host/connection.h"
+
+#include <atomic>
+
+#include "host/data_object.h"
+#include "host/host_error.h"
+#include "host/param_list.h"
+#include "host/sql_translator.h"
+#include "runtime/convert.h"
+#include "runtime/dates.h"
+#include "runtime/text.h"
+
+namespace xal::host {
+
+extern const char kSchemaSql[];
+
+namespace {
+std::atomic<int64_t> gNextSession{1};
+
+// The text an option is stored as: numbers in "." form, dates as serials, Booleans as -1/0, so
+// that what is read back converts to the same value in any locale.
+std::string StoredText(const Variant& v) {
+  switch (v.Type()) {
+    case VarType::Boolean: return v.AsBool() ? "-1" : "0";
+    case VarType::Date: return DoubleToString(v.AsDate().serial);
+    case VarType::Null:
+    case VarType::Empty: return "";
+    default: return CStr(v);
+  }
+}
+}  // namespace
+
+// ---------------------------------------------------------------------------------------------
+// Opening
+// ---------------------------------------------------------------------------------------------
+
+HostConnection::HostConnection(std::shared_ptr<Database> db, int32_t kind, int32_t userID)
+    : db_(std::move(db)), kind_(kind), userID_(userID), session_(gNextSession++) {}
+
+HostConnection::~HostConnection() {
+  // Locks die with their holder, as a server drops a session's locks when it disconnects.
+  try {
+    db_->Exec("DELETE FROM XALLock WHERE Holder = ?", {Variant(static_cast<double>(session_))});
+  } catch (const VbError&) {
+  }
+}
+
+Ref<HostConnection> HostConnection::Open(const std::string& path, int32_t kind, int32_t userID) {
+  auto db = std::make_shared<Database>(path);
+  if (!db->TableExists("GDocument")) {
+    // One transaction for the whole schema: a file database would otherwise sync every statement.
+    db->ExecScript("BEGIN");
+    try {
+      db->ExecScript(kSchemaSql);
+      db->ExecScript("COMMIT");
+    } catch (const VbError&) {
+      db->ExecScript("ROLLBACK");
+      throw;
+    }
+  }
+  Ref<HostConnection> c(new HostConnection(std::move(db), kind, userID));
+  c->server_ = MakeRef<HostServer>(c);
+  return c;
+}
+
+Ref<XALServer> HostConnection::Server() { return server_; }
+
+std::string HostConnection::Translate(const std::string& sql) const { return TranslateToSqlite(sql, kind_); }
+
+Ref<DataObject> HostConnection::UserObject() {
+  return OpenRows("SELECT * FROM XALUser WHERE ID = ?", "XALUser", "XALUser", {Variant(userID_)});
+}
+
+// ---------------------------------------------------------------------------------------------
+// Options and settings
+// ---------------------------------------------------------------------------------------------
+
+Variant HostConnection::UserOption(int32_t user, const std::string& section, const std::string& key,
+                                   const Variant& defaultValue) {
+  Variant v = db_->Scalar("SELECT OptValue FROM XALUserOption WHERE IDXALUser = ? AND Category = ? AND Name = ?",
+                          {Variant(user), Variant(section), Variant(key)});
+  return v.IsNull() ? defaultValue : v;
+}
+
+Variant HostConnection::Setting(const std::string& category, const std::string& name, const Variant& defaultValue) {
+  return UserOption(0, category, name, defaultValue);
+}
+
+void HostConnection::SetUserOption(int32_t user, const std::string& section, const std::string& key,
+                                   const Variant& value) {
+  db_->Exec("INSERT INTO XALUserOption (IDXALUser, Category, Name, OptValue) VALUES (?, ?, ?, ?) "
+            "ON CONFLICT (IDXALUser, Category, Name) DO UPDATE SET OptValue = excluded.OptValue",
+            {Variant(user), Variant(section), Variant(key), Variant(StoredText(value))});
+}
+
+void HostConnection::SetSetting(const std::string& category, const std::string& name, const Variant& value) {
+  SetUserOption(0, category, name, value);
+}
+
+// ---------------------------------------------------------------------------------------------
+// SQL, commands, rights, log
+// ---------------------------------------------------------------------------------------------
+
+Variant HostConnection::Execute(const std::string& sql, int32_t) {
+  try {
+    int64_t n = db_->Exec(Translate(sql));
+    InvalidateLinks();
+    return Variant(static_cast<int32_t>(n));
+  } catch (const VbError& e) {
+    lastError_ = e.description();
+    InvalidateLinks();
+    throw;
+  }
+}
+
+Variant HostConnection::Lock(const Ref<ParamList>& params, bool take) {
+  std::string name = params ? CStr(params->Item("XALType")) + "/" + CStr(params->Item("LockType")) : "";
+  if (params && params->Exists("ID")) name += "/" + CStr(params->Item("ID"));
+  const Variant me(static_cast<double>(session_));
+  if (!take) {
+    db_->Exec("DELETE FROM XALLock WHERE Name = ? AND Holder = ?", {Variant(name), me});
+    return Variant(true);
+  }
+  Variant holder = db_->Scalar("SELECT Holder FROM XALLock WHERE Name = ?", {Variant(name)});
+  if (!holder.IsNull()) return Variant(CDbl(holder) == static_cast<double>(session_));
+  db_->Exec("INSERT INTO XALLock (Name, Holder, TakenAt) VALUES (?, ?, ?)", {Variant(name), me, Variant(Now())});
+  return Variant(true);
+}
+
+Variant HostConnection::ServerCommand(const std::string& name, const Ref<ParamList>& params) {
+  if (TextEquals(name, "Lock")) return Lock(params, true);
+  if (TextEquals(name, "UnLock")) return Lock(params, false);
+  if (TextEquals(name, "Update_DCurBalance")) {
+    // Rebuilds the current balances of the rows a field value selects (or all of them).
+    std::string field = params ? CStr(params->Item("FieldName")) : "";
+    std::string where = field.empty() ? "" : " WHERE " + field + " = ?";
+    std::vector<Variant> args;
+    if (!field.empty()) args.push_back(params->Item("FieldValue"));
+    if (!field.empty() && !TextEquals(field, "IDGRArticle") && !TextEquals(field, "IDDRStore"))
+      Raise(kErrInvalidCall, "Update_DCurBalance: unknown field " + field);
+    std::string keyWhere = field.empty() ? "" : (TextEquals(field, "IDDRStore") ? " WHERE IDDRStore = ?" : where);
+    db_->Exec("DELETE FROM DCurBalanceStore" + keyWhere, args);
+    db_->Exec("INSERT INTO DCurBalanceStore SELECT *, CASE WHEN Quantity + RQuantity <> 0 THEN AmountBase / "
+              "(Quantity + RQuantity) ELSE 0 END FROM vCurBalanceStore" + keyWhere, args);
+    InvalidateLinks();
+    return Variant(true);
+  }
+  if (TextEquals(name, "ResetOptions")) {
+    // Options that name a record of a table: an old id becomes the new one ("" for none).
+    std::string table = CStr(params->Item("TableName"));
+    std::string oldID = CStr(params->Item("OldID")), newID = CStr(params->Item("NewID"));
+    db_->Exec("UPDATE XALUserOption SET OptValue = ? WHERE OptValue = ? AND EXISTS (SELECT 1 FROM XALOptionList L "
+              "WHERE L.Category = XALUserOption.Category AND L.Name = XALUserOption.Name AND L.TableName = ? "
+              "AND L.Type = 'ID')",
+              {Variant(newID == "0" ? std::string() : newID), Variant(oldID), Variant(table)});
+    return Variant(true);
+  }
+  Raise(kErrInvalidCall, "Unknown server command " + name);
+}
+
+bool HostConnection::CheckRight(int32_t user, const std::string& kind, const std::string& object, int32_t,
+                                int32_t b) {
+  Variant denied = db_->Scalar("SELECT Denied FROM XALRight WHERE IDXALUser = ? AND Kind = ? AND ObjectName = ?",
+                               {Variant(user), Variant(kind), Variant(object)});
+  if (denied.IsNull()) return true;
+  return (CLng(denied) & b) == 0;
+}
+
+bool HostConnection::LogCheck(const std::string& kind, const std::string& table, int32_t) {
+  Variant n = db_->Scalar("SELECT count(*) FROM XALLogTable WHERE TableName = ? AND (Kind = ? OR Kind = '')",
+                          {Variant(table), Variant(kind)});
+  return CLng(n) > 0;
+}
+
+void HostConnection::WriteLog(const std::string& kind, const std::string& table, int32_t id, const std::string& text) {
+  db_->Exec("INSERT INTO XALLog (IDXALUser, Kind, TableName, IDRecord, LogText, LogTime) VALUES (?, ?, ?, ?, ?, ?)",
+            {Variant(userID_), Variant(kind), Variant(table), Variant(id), Variant(text), Variant(Now())});
+}
+
+Variant HostConnection::Property(int32_t number) {
+  if (number == 8) return Variant(langID_);
+  return Variant();
+}
+
+// Nested begins are savepoints, so a component transaction inside a host one still rolls back alone.
+bool HostConnection::BeginTransaction() {
+  db_->ExecScript("SAVEPOINT xal_t" + std::to_string(transactionDepth_));
+  ++transactionDepth_;
+  return true;
+}
+
+void HostConnection::CommitTransaction() {
+  if (transactionDepth_ == 0) return;
+  --transactionDepth_;
+  db_->ExecScript("RELEASE SAVEPOINT xal_t" + std::to_string(transactionDepth_));
+}
+
+void HostConnection::RollbackTransaction() {
+  if (transactionDepth_ == 0) return;
+  --transactionDepth_;
+  const std::string sp = "xal_t" + std::to_string(transactionDepth_);
+  db_->ExecScript("ROLLBACK TO SAVEPOINT " + sp + "; RELEASE SAVEPOINT " + sp);
+  InvalidateLinks();
+}
+
+// ---------------------------------------------------------------------------------------------
+// Rows, links and the table catalogue
+// ---------------------------------------------------------------------------------------------
+
+Ref<HostDataObject> HostConnection::OpenRows(const std::string& sql, const std::string& table,
+                                             const std::string& writeTable, const std::vector<Variant>& params) {
+  ResultSet rs = db_->Query(sql, params);
+  auto self = std::static_pointer_cast<HostConnection>(shared_from_this());
+  return MakeRef<HostDataObject>(self, table, writeTable, std::move(rs));
+}
+
+std::string HostConnection::BaseTable(const std::string& table) {
+  std::string key = FoldCase(table);
+  auto it = baseTables_.find(key);
+  if (it != baseTables_.end()) return it->second;
+  Variant base = db_->Scalar("SELECT BaseTable FROM XALTable WHERE TableName = ?", {Variant(table)});
+  std::string result = (base.IsString() && !base.AsString().empty()) ? base.AsString() : table;
+  baseTables_[key] = result;
+  return result;
+}
+
+bool HostConnection::ResolveLink(const std::string& link, std::string& field, std::string& table) {
+  std::string key = FoldCase(link);
+  auto it = links_.find(key);
+  if (it == links_.end()) {
+    ResultSet rs = db_->Query("SELECT FieldName, TargetTable FROM XALLink WHERE LinkName = ?", {Variant(link)});
+    std::pair<std::string, std::string> resolved;
+    if (!rs.rows.empty())
+      resolved = {rs.rows[0][0].AsString(), rs.rows[0][1].AsString()};
+    else if (db_->TableExists(link))
+      resolved = {"ID" + link, BaseTable(link)};
+    it = links_.emplace(key, resolved).first;
+  }
+  if (it->second.first.empty()) return false;
+  field = it->second.first;
+  table = it->second.second;
+  return true;
+}
+
+const LinkedRow* HostConnection::LinkedRecord(const std::string& table, int32_t id) {
+  std::string key = table;
+  key += '#';
+  key += std::to_string(id);
+  auto it = linkCache_.find(key);
+  if (it != linkCache_.end()) return it->second.get();
+  ResultSet rs = db_->Query("SELECT * FROM \"" + table + "\" WHERE ID = ?", {Variant(id)});
+  std::unique_ptr<LinkedRow> row;
+  if (!rs.rows.empty()) {
+    row = std::make_unique<LinkedRow>();
+    for (size_t i = 0; i < rs.columns.size(); ++i) row->fields.emplace(FoldCase(rs.columns[i]), rs.rows[0][i]);
+  }
+  return linkCache_.emplace(key, std::move(row)).first->second.get();
+}
+
+// ---------------------------------------------------------------------------------------------
+// HostServer
+// ---------------------------------------------------------------------------------------------
+
+Ref<HostConnection> HostServer::conn() const {
+  auto c = conn_.lock();
+  if (!c) Raise(kErrObjectNotSet, "The connection of this server is closed");
+  return c;
+}
+
+namespace {
+bool IsPlainName(const std::string& s) {
+  if (s.empty()) return false;
+  for (char ch : s)
+    if (!(std::isalnum(static_cast<unsigned char>(ch)) || ch == '_')) return false;
+  return true;
+}
+}  // namespace
+
+Ref<DataObject> HostServer::OpenQuery(const std::string& sqlOrTable, int32_t, const std::string& filter,
+                                      const std::string& fields) {
+  Ref<HostConnection> c = conn();
+  const std::string source = Trim(sqlOrTable);
+  if (IsPlainName(source)) {
+    std::string sql = "SELECT " + (Trim(fields).empty() ? std::string("*") : fields) + " FROM " + source;
+    if (!Trim(filter).empty()) sql += " WHERE " + filter;
+    return c->OpenRows(c->Translate(sql), source, c->BaseTable(source));
+  }
+  std::string sql = c->Translate(source);
+  if (!Trim(filter).empty()) sql = "SELECT * FROM (" + sql + ") WHERE " + c->Translate(filter);
+  // A query over one table can still write its rows back to that table.
+  ResultSet probe = c->db().Query("SELECT * FROM (" + sql + ") WHERE 0");
+  std::string table = probe.sourceTable;
+  return c->OpenRows(sql, table, table.empty() ? "" : c->BaseTable(table));
+}
+
+Ref<DataObject> HostServer::OpenDataObject(const std::string& table) {
+  Ref<HostConnection> c = conn();
+  if (!IsPlainName(table)) Raise(kErrInvalidCall, "Not a table name: " + table);
+  return c->OpenRows("SELECT * FROM \"" + table + "\"", table, c->BaseTable(table));
+}
+
+Ref<ParamList> HostServer::NewParamList() { return MakeRef<HostParamList>(); }
+
+Ref<XALConnect> HostServer::Connection() { return conn(); }
+
+std::string HostServer::Text(const std::string& key, int32_t kind, int32_t lang) {
+  ResultSet rs = conn()->db().Query("SELECT English, Estonian FROM XALMessage WHERE MsgKey = ? AND Kind = ?",
+                                    {Variant(key), Variant(kind)});
+  if (rs.rows.empty()) return key;
+  const Variant& text = rs.rows[0][lang == 4 ? 1 : 0];
+  return text.IsString() && !text.AsString().empty() ? text.AsString() : rs.rows[0][0].AsString();
+}
+
+Variant HostServer::Property(int32_t number) {
+  auto it = properties_.find(number);
+  if (it != properties_.end()) return it->second;
+  if (number == 5) return Variant(conn()->Language());
+  return Variant(false);
+}
+
+Ref<ParamList> HostServer::TableCatalogue() {
+  auto catalogue = MakeRef<HostParamList>("Catalogue");
+  ResultSet rs = conn()->db().Query(
+      "SELECT TableName, isDocument, isRegister, isReport, CanAdminister, SystemTable FROM XALTable");
+  for (auto& row : rs.rows) {
+    auto entry = MakeRef<HostParamList>(row[0].AsString());
+    for (size_t i = 1; i < rs.columns.size(); ++i) entry->Set(rs.columns[i], row[i]);
+    catalogue->SetObject(row[0].AsString(), entry);
+  }
+  return catalogue;
+}
+
+}  // namespace xal::host
