@@ -778,6 +778,7 @@ CREATE TABLE XALMessage (
 CREATE TABLE XALTable (
   TableName TEXT COLLATE NOCASE PRIMARY KEY,
   BaseTable TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  RowTable TEXT COLLATE NOCASE NOT NULL DEFAULT '',   -- a document kind's row table
   isDocument BOOL INTEGER NOT NULL DEFAULT 0,
   isRegister BOOL INTEGER NOT NULL DEFAULT 0,
   isReport BOOL INTEGER NOT NULL DEFAULT 0,
@@ -827,6 +828,12 @@ INSERT INTO XALTable (TableName, BaseTable, isDocument) VALUES
   ('SDExpenseD', 'GDocument', -1), ('PDReceiptD', 'GDocument', -1), ('DDMovement', 'GDocument', -1),
   ('DDProduction', 'GDocument', -1), ('DDOrder', 'GDocument', -1), ('DDCostInvD', 'GDocument', -1),
   ('GUDocument', 'GDocument', -1), ('VDBank', 'GDocument', -1), ('VDCash', 'GDocument', -1);
+UPDATE XALTable SET RowTable = CASE TableName
+    WHEN 'SDInvoice' THEN 'SDInvoiceRow' WHEN 'PDInvoice' THEN 'PDInvoiceRow' WHEN 'SDOrder' THEN 'SDOrderRow'
+    WHEN 'PDOrder' THEN 'PDOrderRow' WHEN 'DDOrder' THEN 'PDOrderRow' WHEN 'GUDocument' THEN 'GUDocumentRow'
+    WHEN 'VDBank' THEN 'VDVoucherRow' WHEN 'VDCash' THEN 'VDVoucherRow'
+    ELSE 'DDStoreDRow' END
+  WHERE isDocument <> 0 AND TableName <> 'GDocument';
 INSERT INTO XALTable (TableName, isRegister) VALUES
   ('GRArticle', -1), ('GRCompany', -1), ('GRPriceList', -1), ('GRCPriceList', -1), ('GRCurrency', -1),
   ('GRUnit', -1), ('GRBarCode', -1), ('GRTax', -1), ('GRTermPayment', -1), ('GRTermDelivery', -1),

@@ -4,6 +4,7 @@
 // The calendar is proleptic Gregorian throughout, serial 0 being 1899-12-30.
 #include "runtime/dates.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <ctime>
@@ -245,8 +246,8 @@ Date DateAdd(std::string_view interval, double number, Date d) {
     case Unit::Year: return AddMonths(d, n * 12);
     case Unit::Quarter: return AddMonths(d, n * 3);
     case Unit::Month: return AddMonths(d, n);
-    case Unit::Day: return AddSeconds(d, n * kSecondsPerDay);
-    case Unit::Week:
+    case Unit::Day:
+    case Unit::Week: return AddSeconds(d, n * kSecondsPerDay);  // "w" (weekday) adds plain days here
     case Unit::WeekOfYear: return AddSeconds(d, n * 7 * kSecondsPerDay);
     case Unit::Hour: return AddSeconds(d, n * 3600);
     case Unit::Minute: return AddSeconds(d, n * 60);

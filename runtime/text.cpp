@@ -8,6 +8,7 @@
 #include <unicode/ucol.h>
 #include <unicode/utf8.h>
 
+#include <algorithm>
 #include <cstring>
 
 #include "runtime/convert.h"
@@ -127,8 +128,9 @@ class Finder {
       icase_ = true;
     }
     if (!bytes_) {
-      Decode(s, hay_, &offs_);
-      Decode(find, needle_, nullptr);
+      bool fold = mode == CompareMode::Text;
+      Decode(s, fold, hay_, &offs_);
+      Decode(find, fold, needle_, nullptr);
     }
   }
 
@@ -160,12 +162,13 @@ class Finder {
   }
 
  private:
-  static void Decode(std::string_view s, std::u32string& out, std::vector<size_t>* offs) {
+  static void Decode(std::string_view s, bool fold, std::u32string& out, std::vector<size_t>* offs) {
     out.reserve(s.size());
     size_t i = 0;
     while (i < s.size()) {
       if (offs) offs->push_back(i);
-      out.push_back(FoldChar(NextChar(s, i)));
+      int32_t c = NextChar(s, i);
+      out.push_back(fold ? FoldChar(c) : c < 0 ? kReplacement : static_cast<char32_t>(c));
     }
     if (offs) offs->push_back(s.size());
   }

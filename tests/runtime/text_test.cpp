@@ -72,7 +72,9 @@ TEST(TextMid, SlicesByCharacter) {
     std::string got;
     int err = ErrorOf([&] { got = r.length == kOmit ? Mid(r.s, r.start) : Mid(r.s, r.start, r.length); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -99,7 +101,9 @@ TEST(TextLeftRight, TakeCharactersFromEitherEnd) {
     std::string got;
     int err = ErrorOf([&] { got = r.left ? Left(r.s, r.n) : Right(r.s, r.n); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -129,6 +133,7 @@ TEST(TextInStr, FindsFirstPositionFromStart) {
       {1, "Šokolaad", "š", T, 1, 0},
       {1, "Šokolaad", "š", B, 0, 0},
       {1, "ab\xff" "cd", "cd", B, 4, 0},  // bad byte in the text still counts one position
+      {1, "Õ\xff" "õ", "õ", B, 3, 0},    // damaged text: binary search stays case-sensitive
       {0, "abc", "a", B, 0, kErrInvalidCall},  // bad: start must be at least 1
       {-3, "", "", B, 0, kErrInvalidCall},     // bad: start checked before anything else
   };
@@ -137,7 +142,9 @@ TEST(TextInStr, FindsFirstPositionFromStart) {
     int32_t got = -1;
     int err = ErrorOf([&] { got = InStr(r.start, r.s, r.find, r.mode); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -169,7 +176,9 @@ TEST(TextInStrRev, FindsLastMatchEndingByStart) {
     int32_t got = -1;
     int err = ErrorOf([&] { got = InStrRev(r.s, r.find, r.start, r.mode); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -201,7 +210,9 @@ TEST(TextReplace, ReplacesFromStartAndDropsThePrefix) {
     std::string got;
     int err = ErrorOf([&] { got = Replace(r.s, r.find, r.with, r.start, r.count, r.mode); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -234,7 +245,9 @@ TEST(TextSplit, CutsAtEveryDelimiter) {
     V got;
     int err = ErrorOf([&] { got = Split(r.s, r.delimiter, r.limit, r.mode); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
 }
 
@@ -354,7 +367,9 @@ TEST(TextSpaceString, RepeatCharacters) {
     std::string got;
     int err = ErrorOf([&] { got = r.ch.empty() ? Space(r.n) : String(r.n, r.ch); });
     EXPECT_EQ(err, r.error);
-    if (!r.error) EXPECT_EQ(got, r.expected);
+    if (!r.error) {
+      EXPECT_EQ(got, r.expected);
+    }
   }
   EXPECT_EQ(ErrorOf([] { String(2, ""); }), kErrInvalidCall);  // no character to repeat
 }
