@@ -202,6 +202,29 @@ void DocumentSession::Close() {
   sink_.reset();
 }
 
+void DocumentSession::SetSettingAnswer(const std::string& key, const Variant& value) {
+  policy_.settings[FoldCase(key)] = value;
+}
+
+void DocumentSession::SetFunctionAnswer(const std::string& name, const Variant& value) {
+  policy_.functions[FoldCase(name)] = value;
+}
+
+void DocumentSession::SetInputBoxAnswer(bool confirm, const Variant& values) {
+  std::vector<std::pair<std::string, Variant>> pairs;
+  if (values.IsObject()) {
+    if (auto list = std::dynamic_pointer_cast<ParamList>(values.AsObject()))
+      for (int32_t i = 1; i <= list->Count(); ++i) pairs.emplace_back(list->NameAt(i), list->Item(list->NameAt(i)));
+  } else if (values.IsArray()) {
+    const auto& items = values.AsArray().Elements();
+    for (size_t i = 0; i + 1 < items.size(); i += 2) pairs.emplace_back(CStr(items[i]), items[i + 1]);
+  }
+  policy_.inputBox = [confirm, pairs](ParamList& p, const std::string&) {
+    for (const auto& [name, value] : pairs) p.Set(name, value);
+    return confirm;
+  };
+}
+
 std::string DocumentSession::TranscriptText() const {
   std::string out;
   for (const auto& line : transcript_) out += (out.empty() ? "" : "; ") + line;

@@ -50,6 +50,14 @@ class DocumentSession : public Object {
   std::string TranscriptText() const;  // the lines joined with "; "
   void ClearTranscript() { transcript_.clear(); }
 
+  // Answers for scripts and `xal session`: the next MsgBox answer, a setting, a function's
+  // answer, and an input box that confirms (or not) after copying `values` (a ParamList or an
+  // array of name/value pairs) into the caller's list.
+  void AddMsgBoxAnswer(int32_t answer) { policy_.msgBoxAnswers.push_back(answer); }
+  void SetSettingAnswer(const std::string& key, const Variant& value);
+  void SetFunctionAnswer(const std::string& name, const Variant& value);
+  void SetInputBoxAnswer(bool confirm, const Variant& values);
+
   // Writes the header, the rows and the cached sub-rows; returns the document's id.
   int32_t Save();
   // Destroys the proxy and releases the data objects; the session is not used afterwards.

@@ -3,6 +3,8 @@
 
 #include <iostream>
 
+#include "host/connection.h"
+#include "host/document_session.h"
 #include "runtime/dispatch.h"
 #include "runtime/events.h"
 #include "runtime/text.h"
@@ -108,6 +110,17 @@ Json Session::Dispatch(const Json& req) {
   if (!req.is_object()) Raise(kErrInvalidCall, "Invalid procedure call or argument: a request is a JSON object");
   if (req.contains("new")) return {{"result", ToJson(Variant(CreateObject(req["new"].get<std::string>())), handles_)}};
   if (req.contains("call")) return Call(req);
+  if (req.contains("open")) {
+    // A database of the reference host: kind 1 the file database, 2 the server dialect.
+    auto conn = host::HostConnection::Open(req["open"].get<std::string>(), req.value("kind", 1), req.value("user", 1));
+    return {{"result", ToJson(Variant(ObjectRef(conn)), handles_)}};
+  }
+  if (req.contains("document")) {
+    auto conn = std::dynamic_pointer_cast<host::HostConnection>(ObjectOf(req.at("connection")));
+    if (!conn) Raise(kErrTypeMismatch, "Type mismatch: \"connection\" must be a connection handle");
+    auto doc = host::DocumentSession::Open(conn, req["document"].get<std::string>(), req.value("docid", 0));
+    return {{"result", ToJson(Variant(ObjectRef(doc)), handles_)}};
+  }
   if (req.contains("advise")) return Advise(req);
   if (req.contains("unadvise")) return Unadvise(req);
   if (req.contains("release")) {

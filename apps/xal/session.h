@@ -9,6 +9,11 @@
 //        answered from "answers" (event name -> argument position -> value) and reported in that
 //        request's answer as "events":[{"source":1,"name":"Question","dispid":2,"args":[…]}].
 //        The result is the connection's cookie; {"id":5,"unadvise":1,"cookie":C} disconnects.
+//   {"id":6,"open":"demo.db","kind":1}                 -> a connection of the reference host (kind 1
+//        the file database, 2 the server dialect; "user" sets the user id, 1 by default)
+//   {"id":7,"document":"SDInvoice","connection":H,"docid":0}
+//        -> a document session: a new document (docid 0) or a stored one, with its proxy, header
+//        and rows; its events are answered by the session's policy and recorded in its transcript.
 //   Failures: {"id":…,"error":{"number":438,"description":"…"}}.
 #pragma once
 

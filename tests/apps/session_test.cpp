@@ -180,3 +180,35 @@ TEST(XalBinary, CallCommand) {
 
 }  // namespace
 }  // namespace xal::app
+
+namespace xal::app {
+namespace {
+
+TEST(Session, DatabaseAndDocumentThroughTheProtocol) {
+  std::string db = testing::TempDir() + "xal_session_doc.db";
+  std::remove(db.c_str());
+  Session s;
+  EXPECT_EQ(s.Handle(R"({"id":1,"open":")" + db + R"(","kind":2})"), R"({"id":1,"result":{"object":1}})");
+  EXPECT_EQ(s.Handle(R"({"id":2,"call":1,"member":"DatabaseKind","kind":"get"})"),
+            R"({"id":2,"result":{"type":"Long","value":2},"byref":{}})");
+  s.Handle(R"j({"id":3,"call":1,"member":"Execute","args":["INSERT INTO GRCompany (ID, Code, Name) VALUES (5, 'A', 'Acme')"]})j");
+  EXPECT_EQ(s.Handle(R"({"id":4,"document":"SDInvoice","connection":1})"), R"({"id":4,"result":{"object":2}})");
+  EXPECT_EQ(s.Handle(R"({"id":5,"call":2,"member":"Header","kind":"get"})"),
+            R"({"id":5,"result":{"object":3},"byref":{}})");
+  s.Handle(R"({"id":6,"call":3,"member":"Field","kind":"put","args":["IDGRCompany",5]})");
+  EXPECT_EQ(s.Handle(R"({"id":7,"call":3,"member":"Field","args":["GRCompany.Name"]})"),
+            R"({"id":7,"result":{"type":"String","value":"Acme"},"byref":{}})");
+  s.Handle(R"({"id":8,"call":2,"member":"AddMsgBoxAnswer","args":[7]})");
+  s.Handle(R"({"id":9,"call":2,"member":"Proxy","kind":"get"})");  // handle 4
+  EXPECT_EQ(s.Handle(R"({"id":10,"call":4,"member":"MsgBox","args":["Sure?",4]})"),
+            R"({"id":10,"result":{"type":"Long","value":7},"byref":{}})");
+  EXPECT_EQ(s.Handle(R"({"id":11,"call":2,"member":"Save"})"), R"({"id":11,"result":{"type":"Long","value":1},"byref":{}})");
+  EXPECT_EQ(s.Handle(R"({"id":12,"call":2,"member":"Transcript","kind":"get"})"),
+            R"({"id":12,"result":{"type":"String","value":"MsgBox(\"Sure?\",4)->7"},"byref":{}})");
+  EXPECT_NE(s.Handle(R"({"id":13,"document":"GRArticle","connection":1})").find("\"error\""), std::string::npos);
+  s.Handle(R"({"id":14,"call":2,"member":"Close"})");
+  std::remove(db.c_str());
+}
+
+}  // namespace
+}  // namespace xal::app
