@@ -29,21 +29,29 @@ bool AsciiEqualsNoCase(std::string_view a, std::string_view b) {
 
 char Lower(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
 
-// Splits a pattern at ";" outside quotes and backslash escapes (positive;negative;zero;null).
-std::vector<std::string_view> SplitSections(std::string_view pattern) {
-  std::vector<std::string_view> out;
+// Up to four sections: positive;negative;zero;null. Further ";" stay in the last one.
+struct Sections {
+  std::string_view part[4];
+  size_t count = 0;
+  size_t size() const { return count; }
+  std::string_view operator[](size_t i) const { return part[i]; }
+};
+
+// Splits a pattern at ";" outside quotes and backslash escapes.
+Sections SplitSections(std::string_view pattern) {
+  Sections out;
   size_t start = 0;
   bool quoted = false;
   for (size_t i = 0; i < pattern.size(); ++i) {
     char c = pattern[i];
     if (c == '"') quoted = !quoted;
     else if (c == '\\' && !quoted) ++i;
-    else if (c == ';' && !quoted) {
-      out.push_back(pattern.substr(start, i - start));
+    else if (c == ';' && !quoted && out.count < 3) {
+      out.part[out.count++] = pattern.substr(start, i - start);
       start = i + 1;
     }
   }
-  out.push_back(pattern.substr(std::min(start, pattern.size())));
+  out.part[out.count++] = pattern.substr(std::min(start, pattern.size()));
   return out;
 }
 
@@ -86,7 +94,7 @@ struct NumberPattern {
   int intMin = 0;        // digits always shown: from the first integer '0' to the point
   int firstIntZero = -1;
   int fracPlaces = 0;    // 0/# after the point
-  std::vector<bool> fracZero;  // per fraction place: '0' (pad) or '#' (drop trailing zero)
+  std::string fracKinds;  // per fraction place: '0' pads, '#' drops a trailing zero
   bool grouping = false;
   int scaleDown = 0;     // each "," right before the point divides by 1000
   int percent = 0;
@@ -127,7 +135,7 @@ void AddPlace(NumberPattern& np, bool zero, bool afterPoint) {
   np.tokens.push_back({zero ? Tok::Zero : Tok::Hash, {}});
   if (afterPoint) {
     ++np.fracPlaces;
-    np.fracZero.push_back(zero);
+    np.fracKinds += zero ? '0' : '#';
   } else {
     if (zero && np.firstIntZero < 0) np.firstIntZero = np.intPlaces;
     ++np.intPlaces;
@@ -136,6 +144,7 @@ void AddPlace(NumberPattern& np, bool zero, bool afterPoint) {
 
 NumberPattern ParseNumberPattern(std::string_view s) {
   NumberPattern np;
+  np.tokens.reserve(s.size());
   bool afterPoint = false;
   for (size_t i = 0; i < s.size();) {
     std::string lit;
@@ -195,7 +204,7 @@ struct Rendered {
 void FillFraction(const NumberPattern& np, const DecimalDigits& d, int64_t first, Rendered& r) {
   for (int i = 0; i < np.fracPlaces; ++i) r.fracDigits += DigitAt(d, first + i);
   size_t len = r.fracDigits.size();
-  while (len > 0 && !np.fracZero[len - 1] && r.fracDigits[len - 1] == '0') --len;
+  while (len > 0 && np.fracKinds[len - 1] == '#' && r.fracDigits[len - 1] == '0') --len;
   r.fracDigits.resize(len);
 }
 
@@ -286,7 +295,7 @@ std::string FormatDigits(std::string_view section, DecimalDigits d, bool showSig
 // Picks the section by the value: negative → second, zero → third; an empty or absent one falls
 // back to the first, which then shows the sign itself.
 std::string FormatNumberPattern(std::string_view pattern, DecimalDigits d) {
-  std::vector<std::string_view> sections = SplitSections(pattern);
+  Sections sections = SplitSections(pattern);
   if (d.negative && sections.size() >= 2 && !sections[1].empty()) {
     d.negative = false;
     return FormatDigits(sections[1], d, false);
@@ -494,7 +503,7 @@ std::string FormatAsDate(const Variant& value, std::string_view pattern) {
 
 std::string Format(const Variant& value, std::string_view pattern) {
   if (value.IsNull()) {
-    std::vector<std::string_view> sections = SplitSections(pattern);
+    Sections sections = SplitSections(pattern);
     return sections.size() >= 4 ? FormatDigits(sections[3], {}, false) : std::string();
   }
   if (pattern.empty()) return CStr(value);  // Empty gives "", text stays as it is

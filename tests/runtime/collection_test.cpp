@@ -92,7 +92,7 @@ TEST(KeyedCollection, ScriptObjectByName) {
   EXPECT_EQ(Call(col, "Item", {Variant(1)}), Variant("b"));
   std::vector<Variant> none{Variant(2)};
   EXPECT_EQ(Invoke(col, 0, MemberKind::Method, none), Variant("a"));  // default member
-  Variant all = Call(col, "_NewEnum");
+  Variant all = Call(col, "NewEnum");
   ASSERT_TRUE(all.IsArray());
   EXPECT_EQ(all.AsArray().Elements(), (std::vector<Variant>{Variant("b"), Variant("a")}));
   EXPECT_EQ(ErrorOf([&] { Call(col, "Add", {Variant("c"), Variant(5)}); }), 13);  // a key must be text
