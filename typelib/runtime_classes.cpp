@@ -25,7 +25,7 @@ void RegisterCollection() {
       .Get<&Collection::Count>("Count")
       .Method<&Collection::Item>("Item", {Param("Index")}).Default()
       .Method<&Collection::Remove>("Remove", {Param("Index")})
-      .Method<&Collection::NewEnum>("_NewEnum").Hidden();
+      .Method<&Collection::NewEnum>("NewEnum").Hidden();
 }
 
 void RegisterProbe() {
