@@ -20,6 +20,8 @@ struct RuntimeLocale {
   DateOrder dateOrder = DateOrder::MonthDayYear;
   std::string trueWord = "True";
   std::string falseWord = "False";
+  // The alphabet of Text comparisons ("" language-neutral, "et" Estonian: z < t, ä after õ).
+  std::string collation;
 };
 
 const RuntimeLocale& CurrentLocale();

@@ -4,6 +4,8 @@
 // non-ASCII text and linguistic ordering go through ICU.
 #include "runtime/text.h"
 
+#include "runtime/locale.h"
+
 #include <unicode/uchar.h>
 #include <unicode/ucol.h>
 #include <unicode/utf8.h>
@@ -220,12 +222,19 @@ std::string MapCase(std::string_view s, CaseMap how) {
 
 // One collator per thread: ICU collators are not safe to share between threads while comparing.
 // Secondary strength makes accents significant and letter case not.
+// The collator follows the locale's alphabet and is opened again when that changes.
 UCollator* TextCollator() {
   struct Holder {
     UCollator* c = nullptr;
-    Holder() {
+    std::string name;
+    bool opened = false;
+    void Open(const std::string& locale) {
+      if (c) ucol_close(c);
+      c = nullptr;
+      name = locale;
+      opened = true;
       UErrorCode status = U_ZERO_ERROR;
-      c = ucol_open("", &status);
+      c = ucol_open(locale.c_str(), &status);
       if (U_FAILURE(status)) {
         c = nullptr;
         return;
@@ -237,6 +246,8 @@ UCollator* TextCollator() {
     }
   };
   thread_local Holder holder;
+  const std::string& wanted = CurrentLocale().collation;
+  if (!holder.opened || holder.name != wanted) holder.Open(wanted);
   return holder.c;
 }
 

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "runtime/error.h"
+#include "runtime/locale.h"
 #include "runtime/text.h"
 
 namespace xal {
@@ -482,6 +483,36 @@ TEST(TextUtf, DecodeAndEncode) {
     EXPECT_EQ(ToUtf8(ToUtf32(r.utf8)), r.back);
   }
   EXPECT_EQ(ToUtf8(std::u32string{char32_t(0xD800), U'a', char32_t(0x110000)}), "\uFFFDa\uFFFD");
+}
+
+}  // namespace
+}  // namespace xal
+
+namespace xal {
+namespace {
+
+// Text comparisons follow the locale's alphabet: in Estonian z sorts before t and ä after õ.
+TEST(TextCollation, EstonianAlphabet) {
+  EXPECT_EQ(StrComp("z", "t", CompareMode::Text), 1);  // language-neutral: t < z
+  RuntimeLocale et;
+  et.collation = "et";
+  ScopedLocale scope(et);
+  struct Row {
+    const char* a;
+    const char* b;
+    int expected;
+  } rows[] = {
+      {"z", "t", -1},
+      {"ä", "õ", 1},
+      {"ü", "x", -1},
+      {"Šokk", "sokk", 1},
+      {"ÕUN", "õun", 0},  // case still ignored
+  };
+  for (const auto& r : rows) {
+    SCOPED_TRACE(std::string(r.a) + " vs " + r.b);
+    EXPECT_EQ(StrComp(r.a, r.b, CompareMode::Text), r.expected);
+  }
+  EXPECT_FALSE(Like("t", "[a-z]", CompareMode::Text));  // t is past z in this alphabet
 }
 
 }  // namespace
