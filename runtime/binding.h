@@ -158,14 +158,21 @@ Variant CallWith(Object& self, [[maybe_unused]] std::span<Variant> args, std::in
   using R = typename Traits::Result;
   auto& obj = static_cast<C&>(self);
   std::tuple<ArgSlot<A>...> slots{ArgSlot<A>(args[I])...};
-  if constexpr (std::is_void_v<R>) {
-    (obj.*M)(std::get<I>(slots).get()...);
+  // A by-ref argument keeps what the member left in it even when the member fails, as a
+  // variable passed by reference does.
+  try {
+    if constexpr (std::is_void_v<R>) {
+      (obj.*M)(std::get<I>(slots).get()...);
+      (std::get<I>(slots).WriteBack(), ...);
+      return Variant();
+    } else {
+      Variant result = ArgConv<Bare<R>>::To((obj.*M)(std::get<I>(slots).get()...));
+      (std::get<I>(slots).WriteBack(), ...);
+      return result;
+    }
+  } catch (...) {
     (std::get<I>(slots).WriteBack(), ...);
-    return Variant();
-  } else {
-    Variant result = ArgConv<Bare<R>>::To((obj.*M)(std::get<I>(slots).get()...));
-    (std::get<I>(slots).WriteBack(), ...);
-    return result;
+    throw;
   }
 }
 

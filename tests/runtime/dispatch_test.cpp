@@ -159,3 +159,29 @@ TEST(Dispatch, MethodReadAsPropertyAndBack) {
 
 }  // namespace
 }  // namespace xal
+
+namespace xal {
+namespace {
+
+class Writer : public Object {
+ public:
+  void AppendThenFail(std::string& text) {
+    text += "partial";
+    Raise(kErrTypeMismatch);
+  }
+};
+
+const bool kWriterRegistered = [] {
+  ClassBuilder<Writer>("DispatchWriter").Creatable().Method<&Writer::AppendThenFail>("AppendThenFail", {Param("Text")});
+  return true;
+}();
+
+TEST(Dispatch, ByRefKeepsWhatTheMemberWroteBeforeFailing) {
+  ObjectRef w = CreateObject("DispatchWriter");
+  std::vector<Variant> args{Variant("so far: ")};
+  EXPECT_THROW(Invoke(w, "AppendThenFail", MemberKind::Method, args), VbError);
+  EXPECT_EQ(args[0], Variant("so far: partial"));
+}
+
+}  // namespace
+}  // namespace xal
