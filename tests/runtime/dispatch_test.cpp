@@ -185,3 +185,36 @@ TEST(Dispatch, ByRefKeepsWhatTheMemberWroteBeforeFailing) {
 
 }  // namespace
 }  // namespace xal
+
+namespace xal {
+namespace {
+
+class Lines : public Object {
+ public:
+  std::string Text(int32_t line) const { return line == -1 ? all_ : "line " + std::to_string(line); }
+  void SetText(int32_t line, const std::string& value) { all_ = std::to_string(line) + ":" + value; }
+
+ private:
+  std::string all_;
+};
+
+const bool kLinesRegistered = [] {
+  ClassBuilder<Lines>("DispatchLines").Creatable()
+      .Get<&Lines::Text>("Text", {Def("Line", -1)})
+      .Put<&Lines::SetText>("Text", {Def("Line", -1), Param("Value")});
+  return true;
+}();
+
+TEST(Dispatch, AssignmentValueIsTheLastArgument) {
+  ObjectRef o = CreateObject("DispatchLines");
+  PutProperty(o, "Text", Variant("all"));  // the optional line is left out
+  EXPECT_EQ(GetProperty(o, "Text"), Variant("-1:all"));
+  std::vector<Variant> args{Variant(3), Variant("third")};
+  Invoke(o, "Text", MemberKind::Put, args);
+  EXPECT_EQ(GetProperty(o, "Text"), Variant("3:third"));
+  std::vector<Variant> none;
+  EXPECT_EQ(ErrorOf([&] { Invoke(o, "Text", MemberKind::Put, none); }), 449);  // no value at all
+}
+
+}  // namespace
+}  // namespace xal
