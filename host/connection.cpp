@@ -106,6 +106,8 @@ Variant HostConnection::Execute(const std::string& sql, int32_t) {
   try {
     int64_t n = db_->Exec(Translate(sql));
     InvalidateLinks();
+    // The error text tells about the last statement only; a success leaves none behind.
+    lastError_.clear();
     return Variant(static_cast<int32_t>(n));
   } catch (const VbError& e) {
     lastError_ = e.description();

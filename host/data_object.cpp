@@ -61,8 +61,15 @@ void RegisterDataObjectFunction(const std::string& name, DataObjectFunction fn) 
 }
 
 HostDataObject::HostDataObject(Ref<HostConnection> conn, std::string table, std::string writeTable, ResultSet rs)
-    : conn_(std::move(conn)), table_(std::move(table)), writeTable_(std::move(writeTable)),
-      columns_(std::move(rs.columns)), kinds_(std::move(rs.kinds)) {
+    : conn_(std::move(conn)), table_(std::move(table)), writeTable_(std::move(writeTable)) {
+  Reload(std::move(rs));
+}
+
+void HostDataObject::Reload(ResultSet rs) {
+  columns_ = std::move(rs.columns);
+  kinds_ = std::move(rs.kinds);
+  columnIndex_.clear();
+  rows_.clear();
   for (size_t i = 0; i < columns_.size(); ++i) columnIndex_.emplace(FoldCase(columns_[i]), static_cast<int>(i));
   rows_.reserve(rs.rows.size());
   for (auto& values : rs.rows) {

@@ -61,6 +61,9 @@ class HostDataObject : public DataObject {
   void Save();
   // Whether the column exists (any letter case).
   bool HasColumn(const std::string& name) const { return ColumnIndex(name) >= 0; }
+  // Reopens the data object over `rows` (columns and rows replaced, first row current), as a
+  // named function does that answers with a row of its own ("GetBalance").
+  void Reload(ResultSet rows);
 
  private:
   struct Row {

@@ -23,16 +23,24 @@ std::string ParamText(const Variant& params, const char* name) {
   return params.IsString() ? params.AsString() : std::string();
 }
 
+// The table a field leads to: a dotted path ("Partner.Code", "GRCompany.GRCurrency.Code") names
+// the table of its last link; a link field ("IDPartner") the table it refers to; "" when neither.
 Variant LinkedTableName(HostDataObject& self, const Variant& params, int32_t) {
-  std::string field = ParamText(params, "FieldName");
-  if (field.size() <= 2 || !TextEquals(Left(field, 2), "ID")) return Variant(std::string());
+  std::string field = ParamText(params, "Field");
+  if (field.empty()) field = ParamText(params, "FieldName");
+  HostConnection& conn = *self.HostConn();
   std::string idField, table;
-  if (!self.HostConn()->ResolveLink(Mid(field, 3), idField, table)) {
-    // Aliases are listed by link name; look one up by its field too.
-    ResultSet rs = self.HostConn()->db().Query("SELECT TargetTable FROM XALLink WHERE FieldName = ?", {Variant(field)});
-    return Variant(rs.rows.empty() ? std::string() : rs.rows[0][0].AsString());
+  if (field.find('.') != std::string::npos) {
+    std::vector<std::string> parts = Split(field, ".");
+    for (size_t i = 0; i + 1 < parts.size(); ++i)
+      if (!conn.ResolveLink(parts[i], idField, table)) return Variant(std::string());
+    return Variant(table);
   }
-  return Variant(table);
+  if (field.size() <= 2 || !TextEquals(Left(field, 2), "ID")) return Variant(std::string());
+  if (conn.ResolveLink(Mid(field, 3), idField, table)) return Variant(table);
+  // Aliases are listed by link name; look one up by its field too.
+  ResultSet rs = conn.db().Query("SELECT TargetTable FROM XALLink WHERE FieldName = ?", {Variant(field)});
+  return Variant(rs.rows.empty() ? std::string() : rs.rows[0][0].AsString());
 }
 
 Variant AfterUpdate(HostDataObject& self, const Variant& params, int32_t) {

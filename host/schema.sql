@@ -713,6 +713,44 @@ CREATE TABLE CRCapitalAssets (
   Name TEXT COLLATE NOCASE NOT NULL DEFAULT '',
   Record_state TEXT COLLATE NOCASE NOT NULL DEFAULT ''
 );
+-- Price categories of articles and companies (GRPriceCatRel pairs them with a list and a price
+-- cut), and plain categories with their membership tables (T + "Rel": IDT, IDTCat).
+CREATE TABLE GRArticlePriceCat (
+  ID INTEGER PRIMARY KEY,
+  Code TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Name TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Category TEXT COLLATE NOCASE NOT NULL DEFAULT ''
+);
+CREATE TABLE GRCompanyPriceCat (
+  ID INTEGER PRIMARY KEY,
+  Code TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Name TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Category TEXT COLLATE NOCASE NOT NULL DEFAULT ''
+);
+CREATE TABLE GRArticleCat (
+  ID INTEGER PRIMARY KEY,
+  Code TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Name TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Category TEXT COLLATE NOCASE NOT NULL DEFAULT ''
+);
+CREATE TABLE GRArticleCatRel (
+  ID INTEGER PRIMARY KEY,
+  IDGRArticle INTEGER NOT NULL DEFAULT 0,
+  IDGRArticleCat INTEGER NOT NULL DEFAULT 0
+);
+CREATE INDEX GRArticleCatRel_Art ON GRArticleCatRel (IDGRArticle);
+CREATE TABLE GRCompanyCat (
+  ID INTEGER PRIMARY KEY,
+  Code TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Name TEXT COLLATE NOCASE NOT NULL DEFAULT '',
+  Category TEXT COLLATE NOCASE NOT NULL DEFAULT ''
+);
+CREATE TABLE GRCompanyCatRel (
+  ID INTEGER PRIMARY KEY,
+  IDGRCompany INTEGER NOT NULL DEFAULT 0,
+  IDGRCompanyCat INTEGER NOT NULL DEFAULT 0
+);
+CREATE INDEX GRCompanyCatRel_Comp ON GRCompanyCatRel (IDGRCompany);
 CREATE TABLE GRHoliday (
   ID INTEGER PRIMARY KEY,
   HolidayDate DATE REAL NOT NULL DEFAULT 0,
@@ -839,6 +877,8 @@ INSERT INTO XALTable (TableName, isRegister) VALUES
   ('GRUnit', -1), ('GRBarCode', -1), ('GRTax', -1), ('GRTermPayment', -1), ('GRTermDelivery', -1),
   ('GRDocType', -1), ('GRDocSeries', -1), ('DRStore', -1), ('DRStockReserve', -1), ('GRBankAccount', -1),
   ('VRCashDesk', -1), ('EREmployee', -1), ('ERPerson', -1), ('WRPerson', -1), ('CRCapitalAssets', -1);
+INSERT INTO XALTable (TableName, isRegister) VALUES
+  ('GRArticlePriceCat', -1), ('GRCompanyPriceCat', -1), ('GRArticleCat', -1), ('GRCompanyCat', -1);
 INSERT INTO XALTable (TableName, isReport) VALUES ('GRReport', -1);
 INSERT INTO XALTable (TableName, SystemTable, CanAdminister) VALUES
   ('XALUser', -1, -1), ('XALUserOption', -1, 0), ('XALOptionList', -1, 0), ('xalurights', -1, -1);

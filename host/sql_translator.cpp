@@ -81,12 +81,16 @@ class Emitter {
     if (piece.empty()) return;
     if (afterLineComment_) {
       if (piece.front() != '\n' && piece.front() != '\r') s_ += '\n';
-    } else if (!s_.empty() && Fuses(s_.back(), piece.front())) {
+    } else if (!s_.empty() && (Fuses(s_.back(), piece.front()) ||
+                               (break_ && MayJoin(s_.back()) && MayJoin(piece.front())))) {
       s_ += ' ';
     }
     s_ += piece;
     afterLineComment_ = lineComment;
+    break_ = false;
   }
+  // Marks a removed token: the next piece gets a blank when it would otherwise touch the last one.
+  void Break() { break_ = true; }
   std::string Take() { return std::move(s_); }
 
  private:
@@ -94,8 +98,14 @@ class Emitter {
     return (IsNameChar(a) && IsNameChar(b)) || (a == '-' && b == '-') || (a == '/' && b == '*') ||
            (a == b && (a == '\'' || a == '"'));
   }
+  // Characters that can be part of a longer token (blanks and , ( ) ; never are).
+  static bool MayJoin(char c) {
+    return !(c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\f' || c == '\v' || c == ',' || c == '(' ||
+             c == ')' || c == ';');
+  }
   std::string s_;
   bool afterLineComment_ = false;
+  bool break_ = false;
 };
 
 // ---- Literals -----------------------------------------------------------------------------------
@@ -195,7 +205,8 @@ constexpr TypeRule kColumnTypes[] = {
     {"LONG", "INTEGER"},          {"INTEGER", "INTEGER"},        {"INT", "INTEGER"},
     {"SHORT", "INTEGER"},         {"SMALLINT", "INTEGER"},       {"BYTE", "INTEGER"},
     {"TINYINT", "INTEGER"},       {"YESNO", "BOOL INTEGER"},     {"BIT", "BOOL INTEGER"},
-    {"LOGICAL", "BOOL INTEGER"},  {"BOOLEAN", "BOOL INTEGER"},   {"CURRENCY", "CURRENCY REAL"},
+    {"LOGICAL", "BOOL INTEGER"},  {"BOOLEAN", "BOOL INTEGER"},   {"BOOL", "BOOL INTEGER"},
+    {"CURRENCY", "CURRENCY REAL"},
     {"MONEY", "CURRENCY REAL"},   {"DOUBLE", "REAL"},            {"SINGLE", "REAL"},
     {"FLOAT", "REAL"},            {"REAL", "REAL"},              {"NUMERIC", "REAL"},
     {"DECIMAL", "REAL"},          {"NUMBER", "REAL"},            {"DATETIME", "DATE REAL"},
@@ -212,6 +223,7 @@ struct Tok {
   SqlToken src;
   std::string out;     // the text emitted for the token
   std::string suffix;  // text emitted right after it (a moved LIMIT); kept when the token is blanked
+  bool removed = false; // taken out of the text by a rewrite
   int match = -1;      // significant position of the partner parenthesis
   int level = -1;      // significant position of the enclosing "(", -1 at the top level
 };
@@ -229,6 +241,9 @@ class Statement {
     Literals();
     Functions();
     Clauses();
+    // The statement passes read the statement as the clause passes left it, so that what they
+    // removed (hints, TOP n, escapes) cannot hide a leading keyword from them.
+    Structure(/*skipRemoved=*/true);
     if (N() > 0 && Is(0, "UPDATE") && RewriteUpdate(e)) return;
     if (N() > 0 && Is(0, "SELECT")) SelectInto();
     if (N() > 0 && Is(0, "DROP")) Drop();
@@ -259,15 +274,22 @@ class Statement {
       if (Is(p, word)) return p;
     return -1;
   }
+  // Takes a token (and the blank after it) out of the text. Its neighbours are kept apart by a
+  // blank if they would otherwise touch, so a removal never creates a new token.
+  void Remove(int t) {
+    t_[t].out.clear();
+    t_[t].removed = true;
+  }
   void Blank(int p, bool withSpaceAfter) {
-    At(p).out.clear();
+    Remove(sig_[p]);
     int t = sig_[p] + 1;
-    if (withSpaceAfter && t < end_ && t_[t].src.kind == K::kSpace) t_[t].out.clear();
+    if (withSpaceAfter && t < end_ && t_[t].src.kind == K::kSpace) Remove(t);
   }
 
   void EmitTokens(Emitter& e, int from, int to) {
     for (int t = from; t < to; ++t) {
       e.Append(t_[t].out, t_[t].src.kind == K::kLineComment && !t_[t].out.empty());
+      if (t_[t].removed) e.Break();
       e.Append(t_[t].suffix);
     }
   }
@@ -281,11 +303,13 @@ class Statement {
       if (t_[t].src.kind == K::kBlockComment && !t_[t].src.terminated) Refuse("text: a /* comment is not closed");
   }
 
-  void Structure() {
+  void Structure(bool skipRemoved = false) {
     std::vector<int> open;
+    sig_.clear();
     for (int t = begin_; t < end_; ++t) {
       K k = t_[t].src.kind;
       if (k == K::kSpace || k == K::kLineComment || k == K::kBlockComment) continue;
+      if (skipRemoved && t_[t].removed && t_[t].suffix.empty()) continue;
       int p = N();
       sig_.push_back(t);
       Tok& x = t_[t];
@@ -333,7 +357,7 @@ class Statement {
           break;
         case K::kOdbcFn:
           fnLevels.push_back(x.level);
-          x.out.clear();
+          Remove(sig_[p]);
           break;
         case K::kBadNumber:
           Refuse("number " + std::string(s.text) + ": digits run into a point or letter");
@@ -353,7 +377,7 @@ class Statement {
             if (fnLevels.empty() || fnLevels.back() != x.level)
               Refuse("'}': braces other than {fn …} and {d|t|ts '…'} belong to the host's filter layer");
             fnLevels.pop_back();
-            x.out.clear();
+            Remove(sig_[p]);
           } else if (s.text == "{") {
             Refuse("'{': braces other than {fn …} and {d|t|ts '…'} belong to the host's filter layer");
           } else if (s.text == "&") {
@@ -474,8 +498,8 @@ class Statement {
       if (!ok) return;
     }
     int t = sig_[with] - 1;
-    if (t >= begin_ && t_[t].src.kind == K::kSpace) t_[t].out.clear();
-    for (t = sig_[with]; t <= sig_[close]; ++t) t_[t].out.clear();
+    if (t >= begin_ && t_[t].src.kind == K::kSpace) Remove(t);
+    for (t = sig_[with]; t <= sig_[close]; ++t) Remove(t);
   }
 
   // ---- Pass 4: statements ----
@@ -550,8 +574,8 @@ class Statement {
           Refuse("UPDATE: SET target " + TextOf(a, b - 1) + " is not a column of the target");
         if (!EqualsNoCase(NameValue(a), owner))
           Refuse("UPDATE: SET target " + TextOf(a, a + 2) + " belongs to another table");
-        Blank(a, false);
-        Blank(a + 1, false);
+        At(a).out.clear();  // a qualifier before its "." and column never joins two tokens
+        At(a + 1).out.clear();
         qualified = true;
       }
       a = b + 1;
@@ -607,15 +631,20 @@ class Statement {
   }
 
   // Index names are database-wide in SQLite but per table in the file engine: prefix the table.
-  std::string IndexName(int table, int index) { return NameText(NameValue(table) + "_" + NameValue(index)); }
+  // A name that already carries the prefix keeps it.
+  std::string IndexName(int table, int index) {
+    std::string prefix = NameValue(table) + "_", name = NameValue(index);
+    return NameText(EqualsNoCase(std::string_view(name).substr(0, prefix.size()), prefix) ? name : prefix + name);
+  }
 
   void Drop() {
     if (Is(1, "TABLE") && !Is(2, "IF")) {
       At(1).out += " IF EXISTS";
     } else if (Is(1, "INDEX") && !Is(2, "IF") && IsName(2) && Is(3, "ON") && IsName(4) && N() == 5) {
       At(1).out += " IF EXISTS";
+      Blank(2, true);  // the blank before ON goes too
       At(2).out = IndexName(4, 2);
-      Blank(3, false);
+      Blank(3, true);
       Blank(4, false);
     }
   }
@@ -643,13 +672,19 @@ class Statement {
       if (Is(p, "CONSTRAINT") || Is(p, "PRIMARY") || Is(p, "UNIQUE") || Is(p, "FOREIGN") || Is(p, "CHECK")) continue;
       int type = p + 1;
       if (type > def.last || KindAt(type) != K::kIdentifier) continue;
-      if (Is(type + 1, "PRECISION")) Blank(type + 1, false);  // DOUBLE PRECISION
+      bool more = type + 1 <= def.last;
+      if (more && Is(type + 1, "PRECISION")) Blank(type + 1, false);  // DOUBLE PRECISION
       const TypeRule* rule = nullptr;
       for (const TypeRule& r : kColumnTypes)
         if (Is(type, r.from)) rule = &r;
       if (!rule) Refuse("CREATE TABLE: column type " + std::string(At(type).src.text) + " of " + NameValue(p));
-      At(type).out = rule->to;
-      if (KindAt(type + 1) == K::kLParen) {  // TEXT(50), DECIMAL(19, 4): SQLite ignores sizes
+      // Declared types this translator writes ("CURRENCY REAL", "TEXT COLLATE …") stay as they are.
+      std::string_view to = rule->to;
+      size_t blank = to.rfind(' ');
+      bool complete = more && blank != std::string_view::npos &&
+                      (Is(type + 1, to.substr(blank + 1)) || (Is(type + 1, "COLLATE") && Is(type, "TEXT")));
+      if (!complete) At(type).out = to;
+      if (more && KindAt(type + 1) == K::kLParen) {  // TEXT(50), DECIMAL(19, 4): SQLite ignores sizes
         for (int k = type + 1; k <= At(type + 1).match; ++k) Blank(k, false);
       }
     }
@@ -667,7 +702,7 @@ std::string TranslateToSqlite(std::string_view sql, int databaseKind) {
   std::vector<SqlToken> tokens = TokenizeSql(sql);
   std::vector<Tok> toks;
   toks.reserve(tokens.size());
-  for (const SqlToken& s : tokens) toks.push_back(Tok{s, std::string(s.text), {}, -1, -1});
+  for (const SqlToken& s : tokens) toks.push_back(Tok{s, std::string(s.text), {}, false, -1, -1});
 
   Emitter e;
   int begin = 0, depth = 0;

@@ -35,6 +35,9 @@ std::string SQLText(std::string_view text) {
 }
 
 Variant Round(const Variant& pInVal, int16_t pPos) {
+  // Format passes text that is not a number through unchanged; a rounding must fail on it (and on
+  // Null) as the scaled branch below does, rather than hand back the text as if it were rounded.
+  (void)CDbl(pInVal);
   if (pPos >= 1) return Variant(Format(pInVal, "0." + std::string(static_cast<size_t>(pPos), '0')));
   // d = 10^n built by repeated multiplication from 0.1, as the amounts stored so far were.
   const int n = std::abs(static_cast<int>(pPos));

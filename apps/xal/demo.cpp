@@ -1,7 +1,18 @@
-// The demo run: value semantics, late-bound calls and events, printed as a short report.
+// The demo run: value semantics, late-bound calls and events, and the demo database (companies,
+// articles, stock per store, currency rates, a stored invoice opened as a document), printed as
+// a short report.
 #include "apps/xal/demo.h"
 
+#include <unistd.h>
+
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+
+#include "host/demo_db.h"
+#include "host/document_session.h"
 #include "runtime/convert.h"
+#include "runtime/dates.h"
 #include "runtime/dispatch.h"
 #include "runtime/events.h"
 #include "runtime/format.h"
@@ -69,11 +80,135 @@ void LateBound(std::ostream& out) {
   cls->DisconnectGeneric(*probe, cookie);
 }
 
+// Text padded to a width in characters (not bytes: the names are Estonian and Latvian).
+std::string Pad(const std::string& s, size_t width) {
+  size_t chars = 0;
+  for (unsigned char c : s) chars += (c & 0xC0) != 0x80 ? 1 : 0;
+  return chars >= width ? s : s + std::string(width - chars, ' ');
+}
+
+std::string Fixed(const Variant& v, int decimals) {
+  char buf[64];
+  std::snprintf(buf, sizeof buf, "%.*f", decimals, v.IsNull() || v.IsEmpty() ? 0.0 : CDbl(v));
+  return buf;
+}
+
+std::string IsoDate(const Variant& v) {
+  const DateParts p = SplitDate(CDate(v));
+  char buf[16];
+  std::snprintf(buf, sizeof buf, "%04d-%02d-%02d", p.year, p.month, p.day);
+  return buf;
+}
+
+void DemoDatabase(std::ostream& out) {
+  const char* env = std::getenv("XAL_DEMO_DB");
+  const bool keep = env && *env;
+  const std::string path = keep ? std::string(env)
+                                : (std::filesystem::temp_directory_path() /
+                                   ("xal_demo_" + std::to_string(::getpid()) + ".db")).string();
+  {
+    Ref<host::HostConnection> conn = host::OpenDemoDatabase(path, 1);
+    host::Database& db = conn->db();
+    out << "The demo database (" << path << ")\n";
+
+    host::ResultSet companies = db.Query(
+        "SELECT C.Code, C.Name, C.CreditLimit, Y.Code, T.Name, P.Name, C.IDGRTermPaymentP FROM GRCompany C "
+        "LEFT JOIN GRCurrency Y ON Y.ID = C.IDGRCurrency LEFT JOIN GRTermPayment T ON T.ID = C.IDGRTermPayment "
+        "LEFT JOIN GRTermPayment P ON P.ID = C.IDGRTermPaymentP ORDER BY C.ID");
+    out << "  Companies (" << companies.rows.size() << ")\n";
+    for (const auto& r : companies.rows) {
+      const bool supplier = CLng(r[6]) != 0;
+      out << "    " << Pad(r[0].AsString(), 10) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 5);
+      if (supplier)
+        out << "supplier, pays in " << r[5].AsString();
+      else if (!r[4].IsNull())
+        out << "customer, " << r[4].AsString() << ", credit limit " << Fixed(r[2], 2);
+      else
+        out << "the owner";
+      out << "\n";
+    }
+
+    host::ResultSet articles = db.Query(
+        "SELECT A.Code, A.Name, A.ArticleType, U.Code, T.TaxPercent, A.IsLot, A.IsSerial, "
+        "(SELECT count(*) FROM GRArtCompletion C JOIN GRArtCompletionRow R ON R.IDGRArtCompletion = C.ID "
+        "WHERE C.IDGRArticle = A.ID) FROM GRArticle A LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit "
+        "LEFT JOIN GRTax T ON T.ID = A.IDGRTax ORDER BY A.ID");
+    out << "  Articles (" << articles.rows.size() << ")\n";
+    for (const auto& r : articles.rows) {
+      const std::string type = r[2].AsString();
+      out << "    " << Pad(r[0].AsString(), 13) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 4)
+          << (type == "S" ? "service" : type == "P" ? "set of " + CStr(r[7]) + " components" : "goods") << ", VAT "
+          << Fixed(r[4], 0) << "%" << (CBool(r[5]) ? ", kept by lot" : "") << (CBool(r[6]) ? ", kept by serial" : "")
+          << "\n";
+    }
+
+    host::ResultSet stock = db.Query(
+        "SELECT S.Code, S.Name, A.Code, A.Name, B.Quantity, B.RQuantity, B.PQuantity, U.Code, B.Cost "
+        "FROM DCurBalanceStore B JOIN DRStore S ON S.ID = B.IDDRStore JOIN GRArticle A ON A.ID = B.IDGRArticle "
+        "LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit ORDER BY S.ID, A.Code");
+    out << "  Stock per store (current balances, at average cost)\n";
+    std::string store;
+    for (const auto& r : stock.rows) {
+      if (r[0].AsString() != store) {
+        store = r[0].AsString();
+        out << "    " << store << " - " << r[1].AsString() << "\n";
+      }
+      out << "      " << Pad(r[2].AsString(), 13) << Pad(r[3].AsString(), 30) << Fixed(r[4], 2) << " "
+          << r[7].AsString() << " at " << Fixed(r[8], 4);
+      if (CDbl(r[5]) != 0) out << ", reserved " << Fixed(Variant(-CDbl(r[5])), 2);
+      if (CDbl(r[6]) != 0) out << ", pre-reserved " << Fixed(r[6], 2);
+      out << "\n";
+    }
+
+    host::ResultSet rates = db.Query(
+        "SELECT C.Code, C.FixedRate, C.DivThreshold, C.IsTriangulation, V.ChangeDate, V.ConversionRate "
+        "FROM GRCurrency C "
+        "LEFT JOIN GRCurValue V ON V.IDGRCurrency = C.ID AND V.ChangeDate = (SELECT max(ChangeDate) FROM GRCurValue "
+        "WHERE IDGRCurrency = C.ID) ORDER BY C.ID");
+    out << "  Currencies (base " << CStr(conn->Setting("GRCurrency", "BaseCurrency", Variant(0)))
+        << ", stock closed before " << IsoDate(conn->Setting("DateFixed", "Store", Variant(0))) << ")\n";
+    for (const auto& r : rates.rows) {
+      out << "    " << Pad(r[0].AsString(), 5);
+      if (!r[4].IsNull())
+        out << "latest rate " << Fixed(r[5], 4) << " of " << IsoDate(r[4]);
+      else
+        out << "fixed rate " << CStr(r[1]);
+      out << (CBool(r[3]) ? " (triangulation)" : "") << "\n";
+    }
+
+    const Variant id = db.Scalar(
+        "SELECT D.ID FROM SDInvoice D ORDER BY (SELECT count(*) FROM SDInvoiceRow R WHERE R.IDDoc = D.ID) DESC, D.ID "
+        "LIMIT 1");
+    if (!id.IsNull()) {
+      auto s = host::DocumentSession::Open(conn, "SDInvoice", CLng(id));
+      Ref<host::HostDataObject> h = s->Header();
+      out << "  Sales invoice " << CStr(h->Field("DocNo")) << " of " << IsoDate(h->Field("DocDate"))
+          << ", opened as a document\n";
+      out << "    customer " << CStr(h->Field("GRCompany.Name")) << ", " << CStr(h->Field("CompanyAddr")) << "\n";
+      out << "    terms " << CStr(h->Field("GRTermPayment.Name")) << ", due " << IsoDate(h->Field("PromptDate"))
+          << ", currency " << CStr(h->Field("GRCurrency.Code")) << "\n";
+      Ref<host::HostDataObject> rows = s->Rows();
+      for (rows->MoveFirst(); !rows->IsEOF(); rows->MoveNext())
+        out << "    " << Pad(CStr(rows->Field("GRArticle.Code")), 13) << Pad(CStr(rows->Field("Name")), 30)
+            << Fixed(rows->Field("Quantity"), 2) << " " << Pad(CStr(rows->Field("GRUnit.Code")), 3) << " x "
+            << Fixed(rows->Field("UnitPrice"), 2) << " = " << Fixed(rows->Field("Amount"), 2) << ", VAT "
+            << Fixed(rows->Field("GRTax.TaxPercent"), 0) << "% " << Fixed(rows->Field("TaxAmount"), 2) << "\n";
+      out << "    VAT " << Fixed(h->Field("TaxAmount"), 2) << ", total " << Fixed(h->Field("TotalAmount"), 2) << "\n";
+      s->Close();
+    }
+  }
+  if (!keep) {
+    std::error_code ec;
+    for (const char* suffix : {"", "-wal", "-shm"}) std::filesystem::remove(path + suffix, ec);
+  }
+}
+
 }  // namespace
 
 int RunDemo(std::ostream& out) {
   Values(out);
   LateBound(out);
+  DemoDatabase(out);
   out << "Type library: " << TypeRegistry::Instance().classes().size() << " classes (xal typelib lists them)\n";
   return 0;
 }

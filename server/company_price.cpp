@@ -1,0 +1,177 @@
+// Company prices: the price of an article for a customer on a date. The price comes from the
+// company's own list (tried first, never marked up), its ordinary list, or the list its price
+// category assigns to the article's category; each list may hand over to the next list of its
+// chain (IDFirst) when it has no valid price or is itself out of date. A chain whose links come
+// back to a list already walked ends there, as if the chain had run out.
+#include "server/company_price.h"
+
+#include <cmath>
+#include <string>
+#include <unordered_set>
+
+#include "runtime/convert.h"
+#include "runtime/dates.h"
+#include "server/sql_utils.h"
+
+namespace xal::server {
+
+namespace {
+
+std::string Num(int32_t v) { return std::to_string(v); }
+
+// An identifier field; a missing row, Empty or Null counts as 0.
+int32_t IdField(const Ref<DataObject>& rs, const char* name) {
+  const Variant v = rs->Field(name);
+  return (v.IsEmpty() || v.IsNull()) ? 0 : CLng(v);
+}
+
+double DateField(const Ref<DataObject>& rs, const char* name) {
+  const Variant v = rs->Field(name);
+  return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDate(v).serial;
+}
+
+// What the company and the article bring to the search.
+struct Customer {
+  int32_t list = 0;         // GRCompany.IDGRPriceList
+  int32_t ownList = 0;      // GRCompany.IDGRPriceListC, tried first
+  int32_t companyCat = 0;   // GRCompany.IDGRCompanyPriceCat
+  int32_t articleCat = 0;   // GRArticle.IDGRArticlePriceCat
+};
+
+// The ordinary starting list: the company's list, else the list of the price-category pair;
+// 0 when there is neither.
+int32_t OrdinaryList(const Ref<XALServer>& server, int32_t article, const Customer& c) {
+  if (c.list != 0) return c.list;
+  if (c.companyCat == 0) return 0;
+  Ref<DataObject> rs = server->OpenQuery(
+      "SELECT A.IDGRPriceList FROM GRPriceCatRel A, GRArticle B WHERE B.ID = " + Num(article) +
+          " AND B.IDGRArticlePriceCat = A.IDGRArticlePriceCat AND A.IDGRCompanyPriceCat = " + Num(c.companyCat),
+      3, "", "");
+  if (rs->IsEOF()) return 0;
+  return IdField(rs, "IDGRPriceList");
+}
+
+// The newest price row of `list` that covers `date` (an EndDate before 1900 is open); false when
+// none does.
+bool ValidPriceRow(const Ref<XALServer>& server, int32_t article, int32_t list, Date date, Currency& price) {
+  Ref<DataObject> rs = server->OpenQuery("SELECT * FROM GRPriceListRel WHERE IDGRArticle = " + Num(article) +
+                                             " AND IDGRPriceList = " + Num(list) + " ORDER BY BeginDate DESC, EndDate",
+                                         1, "", "");
+  for (; !rs->IsEOF(); rs->MoveNext()) {
+    const double begin = DateField(rs, "BeginDate");
+    const double end = DateField(rs, "EndDate");
+    if (begin <= date.serial && (end >= date.serial || Year(Date(end)) < 1900)) {
+      const Variant p = rs->Field("Price");
+      price = (p.IsEmpty() || p.IsNull()) ? Currency() : CCur(p);
+      return true;
+    }
+  }
+  return false;
+}
+
+// The next list of `list`'s chain, 0 at the end (or when the list does not exist).
+int32_t NextList(const Ref<XALServer>& server, int32_t list) {
+  Ref<DataObject> rs =
+      server->OpenQuery("SELECT IDFirst, IsBruto, WithoutPriceCut FROM GRPriceList WHERE ID = " + Num(list), 1, "", "");
+  return rs->IsEOF() ? 0 : IdField(rs, "IDFirst");
+}
+
+// The price-category markup for the list the price was found in, when the pair has one.
+Currency WithPriceCut(const Ref<XALServer>& server, Currency price, const Customer& c, int32_t list) {
+  Ref<DataObject> rs = server->OpenQuery(
+      "SELECT A.PriceCut AS PriceCut FROM GRPriceCatRel A WHERE A.IDGRArticlePriceCat = " + Num(c.articleCat) +
+          " AND A.IDGRCompanyPriceCat = " + Num(c.companyCat) + " AND A.IDGRPriceList = " + Num(list),
+      3, "", "");
+  if (rs->IsEOF()) return price;
+  const Variant cut = rs->Field("PriceCut");
+  const double pct = (cut.IsEmpty() || cut.IsNull()) ? 0.0 : CDbl(cut);
+  return CCur(Round(Variant(price.ToDouble() * (1 + pct / 100)), 2));
+}
+
+}  // namespace
+
+// Walks the chain from `priceList` to the first list valid on the day of `date` (an EndDate of 0
+// is open). A date before day 1 or no list returns the list as given; a chain that runs out, or
+// comes back to a list already seen, returns 0.
+int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t priceList) {
+  const double t = std::floor(date.serial);
+  if (t < 1 || priceList == 0) return priceList;
+  Ref<XALServer> server = conn->Server();
+  std::unordered_set<int32_t> seen;
+  int32_t list = priceList;
+  while (seen.insert(list).second) {
+    Ref<DataObject> rs =
+        server->OpenQuery("SELECT BeginDate, EndDate, IDFirst FROM GRPriceList WHERE ID = " + Num(list), 1, "", "");
+    if (rs->IsEOF()) return 0;
+    const double b = std::floor(DateField(rs, "BeginDate"));
+    const double e = std::floor(DateField(rs, "EndDate"));
+    if (t >= b && (t <= e || e == 0)) return list;
+    list = IdField(rs, "IDFirst");
+    if (list == 0) return 0;
+  }
+  return 0;
+}
+
+// The price of `pIDGRArticle` for `pIDGRCompany` on `pDate` (today when left out or before 1900);
+// 0 when no list in reach holds a valid price. Failing queries reach the caller.
+Currency GetCompanyPrice(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int32_t pIDGRCompany, Date pDate) {
+  const Date date = Year(pDate) < 1900 ? Today() : pDate;
+  Ref<XALServer> server = pXALConnect->Server();
+
+  Customer c;
+  Ref<DataObject> company = server->OpenQuery(
+      "SELECT IDGRPriceList, IDGRPriceListC, IDGRCompanyPriceCat FROM GRCompany WHERE ID = " + Num(pIDGRCompany), 3, "",
+      "");
+  Ref<DataObject> article =
+      server->OpenQuery("SELECT IDGRArticlePriceCat FROM GRArticle WHERE ID = " + Num(pIDGRArticle), 3, "", "");
+  c.list = IdField(company, "IDGRPriceList");
+  c.ownList = IdField(company, "IDGRPriceListC");
+  c.companyCat = IdField(company, "IDGRCompanyPriceCat");
+  c.articleCat = IdField(article, "IDGRArticlePriceCat");
+
+  // The company's own list first; when its chain yields nothing, the ordinary list once.
+  bool usedOwnList = c.ownList != 0;
+  int32_t list = usedOwnList ? c.ownList : OrdinaryList(server, pIDGRArticle, c);
+  if (!usedOwnList && list == 0) return Currency();
+
+  // Lists whose prices were looked at since the current start; coming back to one means the
+  // chain is a cycle, and it ends there as if it had no further list.
+  std::unordered_set<int32_t> walked;
+  Currency price;
+  bool found = false;
+  while (true) {
+    const bool cycled = !walked.insert(list).second;
+    found = !cycled && ValidPriceRow(server, pIDGRArticle, list, date, price);
+    if (!found && !cycled) {
+      const int32_t next = NextList(server, list);
+      if (next != 0) {
+        list = next;
+        continue;
+      }
+    }
+    if (!cycled) {
+      // A list that is itself out of date gives way to the first valid list of its chain.
+      const int32_t valid = FindValidPriceList(pXALConnect, date, list);
+      if (valid == 0) return Currency();
+      if (valid != list) {
+        list = valid;
+        continue;
+      }
+    }
+    if (!found && usedOwnList) {
+      usedOwnList = false;
+      walked.clear();
+      list = OrdinaryList(server, pIDGRArticle, c);
+      if (list == 0) return Currency();
+      continue;
+    }
+    break;
+  }
+  // The end of a chain with no valid price anywhere.
+  if (!found) return Currency();
+
+  if (c.articleCat != 0 && c.companyCat != 0 && !usedOwnList) price = WithPriceCut(server, price, c, list);
+  return price;
+}
+
+}  // namespace xal::server
