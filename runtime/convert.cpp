@@ -273,6 +273,7 @@ bool ScanNumber(std::string_view text, NumberText& out, const RuntimeLocale& loc
 enum class NumStatus { Ok, Overflow };
 
 double RadixToDouble(const NumberText& t, NumStatus& st) {
+  st = NumStatus::Ok;
   if (t.radixValue > 0xFFFFFFFFu) {
     st = NumStatus::Overflow;
     return 0;
@@ -310,7 +311,7 @@ double TextToDouble(const NumberText& t, NumStatus& st) {
 }
 
 double TextToDoubleOrRaise(const NumberText& t) {
-  NumStatus st;
+  NumStatus st = NumStatus::Ok;
   double v = TextToDouble(t, st);
   if (st == NumStatus::Overflow) Raise(kErrOverflow);
   return v;
@@ -326,7 +327,7 @@ NumberText ScanOrRaise(std::string_view text) {
 // so that "2.5" goes to 2 and "2.50000000000000001" to 3, whatever the nearest double is.
 i128 RoundTextHalfEven(const NumberText& t, int scale) {
   if (t.radix) {
-    NumStatus st;
+    NumStatus st = NumStatus::Ok;
     double v = RadixToDouble(t, st);
     if (st == NumStatus::Overflow) Raise(kErrOverflow);
     i128 r = static_cast<i128>(v);
@@ -353,7 +354,7 @@ double ParseNumber(std::string_view text) { return TextToDoubleOrRaise(ScanOrRai
 bool IsNumericText(std::string_view text) {
   NumberText t;
   if (!ScanNumber(text, t, CurrentLocale())) return false;
-  NumStatus st;
+  NumStatus st = NumStatus::Ok;
   TextToDouble(t, st);
   return st == NumStatus::Ok;
 }
