@@ -67,11 +67,14 @@ void LateBound(std::ostream& out) {
   PutProperty(probe, "name", Variant("demo"));
   out << "  Name = " << CStr(GetProperty(probe, "NAME")) << "\n";
   std::vector<Variant> args{Variant(40)};
-  out << "  Add(40) with b left out = " << CStr(Invoke(probe, "Add", MemberKind::Method, args)) << "\n";
+  // Each call runs before its line is printed, so the events it raises come first.
+  const std::string sum = CStr(Invoke(probe, "Add", MemberKind::Method, args));
+  out << "  Add(40) with b left out = " << sum << "\n";
   std::vector<Variant> byref{Variant("total"), Variant(": 42")};
   Invoke(probe, "Append", MemberKind::Method, byref);
   out << "  Append(ByRef \"total\", \": 42\") leaves \"" << CStr(byref[0]) << "\"\n";
-  out << "  Ask(\"Continue?\") = " << CStr(Call(probe, "Ask", {Variant("Continue?")})) << "\n";
+  const std::string answer = CStr(Call(probe, "Ask", {Variant("Continue?")}));
+  out << "  Ask(\"Continue?\") = " << answer << "\n";
   try {
     Call(probe, "NoSuchMember");
   } catch (const VbError& e) {
@@ -98,6 +101,24 @@ std::string IsoDate(const Variant& v) {
   char buf[16];
   std::snprintf(buf, sizeof buf, "%04d-%02d-%02d", p.year, p.month, p.day);
   return buf;
+}
+
+// The server functions a document script calls, reached by name as the script reaches them.
+void ServerCalls(std::ostream& out, const Ref<host::HostConnection>& conn, const Ref<host::HostDataObject>& h,
+                 const Ref<host::HostDataObject>& rows) {
+  ObjectRef sf = CreateObject("ServerFunctions");
+  const Variant total = h->Field("TotalAmount");
+  out << "  Server functions on it\n";
+  out << "    in words: " << CStr(Call(sf, "VerbalSum", {total, Variant("EST"), Variant("EEK")})) << "\n";
+  out << "    in words: " << CStr(Call(sf, "VerbalSum", {total, Variant("ENG"), Variant("USD")})) << "\n";
+  for (rows->MoveFirst(); !rows->IsEOF(); rows->MoveNext()) {
+    const Variant article = rows->Field("IDGRArticle");
+    const double stock = CDbl(Call(sf, "CountStockBalance", {Variant(ObjectRef(conn)), article}));
+    const Variant price = Call(sf, "GetCompanyPrice",
+                               {Variant(ObjectRef(conn)), article, h->Field("IDGRCompany"), h->Field("DocDate")});
+    out << "    " << Pad(CStr(rows->Field("GRArticle.Code")), 13) << "in stock " << Fixed(Variant(stock), 2)
+        << ", the customer's price " << Fixed(price, 2) << "\n";
+  }
 }
 
 void DemoDatabase(std::ostream& out) {
@@ -194,6 +215,7 @@ void DemoDatabase(std::ostream& out) {
             << Fixed(rows->Field("UnitPrice"), 2) << " = " << Fixed(rows->Field("Amount"), 2) << ", VAT "
             << Fixed(rows->Field("GRTax.TaxPercent"), 0) << "% " << Fixed(rows->Field("TaxAmount"), 2) << "\n";
       out << "    VAT " << Fixed(h->Field("TaxAmount"), 2) << ", total " << Fixed(h->Field("TotalAmount"), 2) << "\n";
+      ServerCalls(out, conn, h, rows);
       s->Close();
     }
   }
