@@ -189,7 +189,7 @@ struct ThunkFor<M, std::tuple<A...>> {
 }  // namespace internal
 
 // ---------------------------------------------------------------------------------------------
-// Parameter specs and the class builder
+// Parameter descriptions and the class builder
 // ---------------------------------------------------------------------------------------------
 
 // The parts of a parameter the C++ signature cannot tell: its name, optional flag and default.
@@ -230,7 +230,7 @@ class ClassBuilder {
 
  private:
   template <auto M>
-  ClassBuilder& Add(std::string name, MemberKind kind, const std::vector<Param>& specs) {
+  ClassBuilder& Add(std::string name, MemberKind kind, const std::vector<Param>& given) {
     using Traits = MemberFnTraits<decltype(M)>;
     static_assert(std::is_base_of_v<typename Traits::Class, C> || std::is_same_v<typename Traits::Class, C>);
     using Thunks = internal::ThunkFor<M, typename Traits::Args>;
@@ -238,12 +238,12 @@ class ClassBuilder {
     m.name = std::move(name);
     m.kind = kind;
     m.params = Thunks::Params();
-    if (specs.size() != m.params.size())
+    if (given.size() != m.params.size())
       throw std::logic_error("member table of " + info_.name() + "." + m.name + ": parameter count differs");
-    for (size_t i = 0; i < specs.size(); ++i) {
-      m.params[i].name = specs[i].name;
-      m.params[i].optional = specs[i].optional;
-      m.params[i].defaultValue = specs[i].defaultValue;
+    for (size_t i = 0; i < given.size(); ++i) {
+      m.params[i].name = given[i].name;
+      m.params[i].optional = given[i].optional;
+      m.params[i].defaultValue = given[i].defaultValue;
     }
     using R = Bare<typename Traits::Result>;
     if constexpr (!std::is_void_v<R>) {
