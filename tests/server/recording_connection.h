@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "forwarding_host.h"
 #include "host/connection.h"
 #include "runtime/convert.h"
 
@@ -18,76 +19,39 @@ namespace xal::server::sqllog {
 
 class SqlLogConnection;
 
-// Records the text of every query before passing it on; the server it wraps does the work.
-class SqlLogServer : public XALServer {
+// Records the text and mode of every query before passing it on.
+class SqlLogServer : public testing::ForwardingServer {
  public:
   SqlLogServer(Ref<XALServer> inner, std::vector<std::string>* log, XALConnect* conn)
-      : inner_(std::move(inner)), log_(log), conn_(conn) {}
+      : ForwardingServer(std::move(inner), conn), log_(log) {}
   Ref<DataObject> OpenQuery(const std::string& sqlOrTable, int32_t mode, const std::string& filter,
                             const std::string& fields) override {
     log_->push_back(sqlOrTable);
     modes_.push_back(mode);
-    return inner_->OpenQuery(sqlOrTable, mode, filter, fields);
+    return ForwardingServer::OpenQuery(sqlOrTable, mode, filter, fields);
   }
-  Ref<DataObject> OpenDataObject(const std::string& table) override { return inner_->OpenDataObject(table); }
-  Ref<ParamList> NewParamList() override { return inner_->NewParamList(); }
-  Ref<XALConnect> Connection() override;
-  std::string Text(const std::string& key, int32_t kind, int32_t lang) override {
-    return inner_->Text(key, kind, lang);
-  }
-  Variant Property(int32_t number) override { return inner_->Property(number); }
-  Ref<ParamList> TableCatalogue() override { return inner_->TableCatalogue(); }
 
   const std::vector<int32_t>& Modes() const { return modes_; }
   void ClearModes() { modes_.clear(); }
 
  private:
-  Ref<XALServer> inner_;
   std::vector<std::string>* log_;
-  XALConnect* conn_;  // the owning decorator; it outlives this server
   std::vector<int32_t> modes_;
 };
 
 // Forwards every operation to the host connection; SQL texts and setting reads are recorded.
-class SqlLogConnection : public XALConnect {
+class SqlLogConnection : public testing::ForwardingConnection {
  public:
-  explicit SqlLogConnection(Ref<host::HostConnection> inner) : inner_(std::move(inner)) {}
+  explicit SqlLogConnection(Ref<host::HostConnection> inner) : ForwardingConnection(std::move(inner)) {}
 
-  Ref<XALServer> Server() override {
-    if (!server_) server_ = MakeRef<SqlLogServer>(inner_->Server(), &sql_, this);
-    return server_;
-  }
-  int32_t DatabaseKind() override { return inner_->DatabaseKind(); }
-  int32_t UserID() override { return inner_->UserID(); }
-  Ref<DataObject> UserObject() override { return inner_->UserObject(); }
-  Variant UserOption(int32_t user, const std::string& section, const std::string& key,
-                     const Variant& defaultValue) override {
-    return inner_->UserOption(user, section, key, defaultValue);
-  }
   Variant Setting(const std::string& category, const std::string& name, const Variant& defaultValue) override {
     settingReads_.push_back(category + "/" + name);
-    return inner_->Setting(category, name, defaultValue);
-  }
-  void SetSetting(const std::string& category, const std::string& name, const Variant& value) override {
-    inner_->SetSetting(category, name, value);
+    return ForwardingConnection::Setting(category, name, defaultValue);
   }
   Variant Execute(const std::string& sql, int32_t options) override {
     sql_.push_back(sql);
-    return inner_->Execute(sql, options);
+    return ForwardingConnection::Execute(sql, options);
   }
-  Variant ServerCommand(const std::string& name, const Ref<ParamList>& params) override {
-    return inner_->ServerCommand(name, params);
-  }
-  bool CheckRight(int32_t user, const std::string& kind, const std::string& object, int32_t a, int32_t b) override {
-    return inner_->CheckRight(user, kind, object, a, b);
-  }
-  bool LogCheck(const std::string& kind, const std::string& table, int32_t flags) override {
-    return inner_->LogCheck(kind, table, flags);
-  }
-  void WriteLog(const std::string& kind, const std::string& table, int32_t id, const std::string& text) override {
-    inner_->WriteLog(kind, table, id, text);
-  }
-  Variant Property(int32_t number) override { return inner_->Property(number); }
 
   // Every SQL text sent, in order (queries and statements).
   const std::vector<std::string>& Sql() const { return sql_; }
@@ -100,16 +64,13 @@ class SqlLogConnection : public XALConnect {
     if (server_) static_cast<SqlLogServer&>(*server_).ClearModes();
   }
 
+ protected:
+  Ref<XALServer> MakeServer(Ref<XALServer> inner) override { return MakeRef<SqlLogServer>(std::move(inner), &sql_, this); }
+
  private:
-  Ref<host::HostConnection> inner_;
-  Ref<XALServer> server_;
   std::vector<std::string> sql_;
   std::vector<std::string> settingReads_;
 };
-
-inline Ref<XALConnect> SqlLogServer::Connection() {
-  return std::static_pointer_cast<XALConnect>(conn_->shared_from_this());
-}
 
 // A fresh database per test in a temporary file, opened with the kind the parameter names.
 class DialectDbTest : public ::testing::TestWithParam<int32_t> {
