@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 
 #include "runtime/dispatch.h"
@@ -12,14 +14,7 @@
 namespace xal {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 // "key:index" of every item in collection order.
 std::string Indices(const LOItems& list) {

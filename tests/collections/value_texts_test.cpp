@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 
 #include "runtime/dispatch.h"
@@ -11,14 +13,7 @@
 namespace xal {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(ValueTexts, NumberAndItsTextShareOneEntry) {
   ValueTexts vt;

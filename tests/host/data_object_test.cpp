@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include "host/host_error.h"
 #include "host/param_list.h"
 #include "host_fixture.h"
@@ -14,14 +16,7 @@ namespace {
 
 using testing::HostTest;
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 class DataObjects : public HostTest {};
 

@@ -2,6 +2,7 @@
 // error number of a call.
 #pragma once
 
+#include "error_of.h"
 #include <functional>
 #include <initializer_list>
 #include <vector>
@@ -24,13 +25,6 @@ inline Variant Grid(int32_t rows, int32_t cols, std::vector<Variant> items) {
 }
 
 // The run-time error number `f` raises; 0 when it returns normally.
-inline int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 }  // namespace xal::testing

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include "runtime/dispatch.h"
 
 namespace xal {
@@ -15,14 +17,7 @@ std::string Contents(const KeyedCollection<Variant>& c) {
   return s;
 }
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(KeyedCollection, SequenceOfAddItemRemove) {
   KeyedCollection<Variant> c;

@@ -3,6 +3,8 @@
 // rounding into Integer, Long and Currency, Int/Fix/Round/Val/Str, and the errors 6, 13 and 94.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <cmath>
 #include <functional>
 #include <limits>
@@ -14,14 +16,7 @@ namespace xal {
 namespace {
 
 // Runs f and returns the run-time error number it raised, 0 when none.
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 RuntimeLocale CommaLocale() {
   RuntimeLocale l;

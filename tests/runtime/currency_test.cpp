@@ -3,6 +3,8 @@
 // checks. Amounts in stored documents were computed this way, so every raw unit matters.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <cmath>
 #include <functional>
 #include <limits>
@@ -17,14 +19,7 @@ constexpr int64_t kMax = std::numeric_limits<int64_t>::max();
 constexpr int64_t kMin = std::numeric_limits<int64_t>::min();
 
 // Runs f and returns the run-time error number it raised, 0 when none.
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(CurrencyTest, FromDoubleRoundsExactProductHalfEven) {
   struct Row {

@@ -3,6 +3,8 @@
 // DateDiff boundaries, and date text and parsing under the three date orders.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <cmath>
 #include <functional>
 #include <string>
@@ -14,14 +16,7 @@
 namespace xal {
 namespace {
 
-int ErrorOf(const std::function<void()>& call) {
-  try {
-    call();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 RuntimeLocale WithOrder(DateOrder order) {
   RuntimeLocale l;

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include "runtime/binding.h"
 
 namespace xal {
@@ -44,14 +46,7 @@ const bool kRegistered = [] {
   return true;
 }();
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(Dispatch, NamesAreCaseInsensitive) {
   ObjectRef w = CreateObject("wIdGeT");

@@ -3,6 +3,8 @@
 // date patterns. Printed amounts in documents are compared with these texts character for character.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 
 #include "runtime/convert.h"
@@ -12,14 +14,7 @@
 namespace xal {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 struct Row {
   Variant value;

@@ -3,6 +3,8 @@
 // Null propagation, concatenation, and comparisons between mixed types.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 #include <limits>
 
@@ -13,14 +15,7 @@
 namespace xal {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 Variant Cur(int64_t raw) { return Variant(Currency::FromRaw(raw)); }
 

@@ -3,6 +3,8 @@
 // binary versus text comparison, and the UTF-8 conversions on damaged input.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 #include <string>
 #include <vector>
@@ -19,14 +21,7 @@ constexpr CompareMode T = CompareMode::Text;
 constexpr int kOmit = -999;  // "argument left out" in the tables below
 
 // The error number a call raises, 0 when it returns normally.
-int ErrorOf(const std::function<void()>& call) {
-  try {
-    call();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(TextLen, CountsCodePoints) {
   struct Row {

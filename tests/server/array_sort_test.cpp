@@ -4,6 +4,8 @@
 // survive (the middle pivot makes those fast; an "organ pipe" input is still quadratic).
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <algorithm>
 #include <functional>
 #include <random>
@@ -15,14 +17,7 @@
 namespace xal::server {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 // Equal under the sort's own comparison ("b" equals "B").
 bool SameKey(const Variant& a, const Variant& b) { return Compare(a, b, CompareMode::Text) == 0; }

@@ -3,6 +3,8 @@
 // positive, zero and negative positions; values that cannot convert fail with error 13.
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 
 #include "runtime/dates.h"
@@ -12,14 +14,7 @@
 namespace xal::server {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 RuntimeLocale CommaLocale() {
   RuntimeLocale l;

@@ -2,6 +2,8 @@
 // document name (row table, back-pointing field, subsystem).
 #include <gtest/gtest.h>
 
+#include "error_of.h"
+
 #include <functional>
 
 #include "server/sql_utils.h"
@@ -9,14 +11,7 @@
 namespace xal::server {
 namespace {
 
-int ErrorOf(const std::function<void()>& f) {
-  try {
-    f();
-  } catch (const VbError& e) {
-    return e.number();
-  }
-  return 0;
-}
+using ::xal::test::ErrorOf;
 
 TEST(InWhereStr, SkipsMatchesInsideQuotes) {
   struct Row {
