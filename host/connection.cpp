@@ -279,17 +279,40 @@ bool IsPlainName(const std::string& s) {
 }
 }  // namespace
 
+// The host's filter layer: what a form's filter may hold besides a plain condition on its table.
+//   {condition}             braces mark raw SQL for the host: the condition inside is used as it is
+//   Rel.Column op value     one condition on a relation table that names the filtered table's rows
+//                           (a column "ID" + table), as "GRArticleCatRel.IDGRArticleCat = 3" on
+//                           GRArticle: ID IN (SELECT IDGRArticle FROM GRArticleCatRel WHERE …)
+std::string HostServer::FilterCondition(const std::string& table, const std::string& filter) {
+  std::string f = Trim(filter);
+  if (f.size() >= 2 && f.front() == '{' && f.back() == '}') return Trim(f.substr(1, f.size() - 2));
+  const size_t dot = f.find('.');
+  if (dot == std::string::npos || !IsPlainName(f.substr(0, dot))) return f;
+  const std::string rel = f.substr(0, dot);
+  if (TextEquals(rel, table)) return f;
+  size_t end = dot + 1;
+  while (end < f.size() && (std::isalnum(static_cast<unsigned char>(f[end])) || f[end] == '_')) ++end;
+  const std::string rest = f.substr(dot + 1);
+  if (end == dot + 1 || rest.find('.') != std::string::npos) return f;
+  Ref<HostConnection> c = conn();
+  const std::string key = "ID" + table;
+  for (const std::string& col : c->db().TableColumns(rel))
+    if (TextEquals(col, key)) return "ID IN (SELECT " + key + " FROM " + rel + " WHERE " + rest + ")";
+  return f;
+}
+
 Ref<DataObject> HostServer::OpenQuery(const std::string& sqlOrTable, int32_t, const std::string& filter,
                                       const std::string& fields) {
   Ref<HostConnection> c = conn();
   const std::string source = Trim(sqlOrTable);
   if (IsPlainName(source)) {
     std::string sql = "SELECT " + (Trim(fields).empty() ? std::string("*") : fields) + " FROM " + source;
-    if (!Trim(filter).empty()) sql += " WHERE " + filter;
+    if (!Trim(filter).empty()) sql += " WHERE " + FilterCondition(source, filter);
     return c->OpenRows(c->Translate(sql), source, c->BaseTable(source));
   }
   std::string sql = c->Translate(source);
-  if (!Trim(filter).empty()) sql = "SELECT * FROM (" + sql + ") WHERE " + c->Translate(filter);
+  if (!Trim(filter).empty()) sql = "SELECT * FROM (" + sql + ") WHERE " + c->Translate(FilterCondition("", filter));
   // A query over one table can still write its rows back to that table.
   ResultSet probe = c->db().Query("SELECT * FROM (" + sql + ") WHERE 0");
   std::string table = probe.sourceTable;

@@ -106,6 +106,10 @@ class HostServer : public XALServer {
   Variant Property(int32_t number) override;
   Ref<ParamList> TableCatalogue() override;
 
+  // A form filter made a condition on `table`: raw "{…}" unwrapped, a condition on a relation
+  // table turned into an id sub-select; anything else as given.
+  std::string FilterCondition(const std::string& table, const std::string& filter);
+
   // Server properties by number (5: language; 7, 8, 50: whether row rights are in force).
   void SetProperty(int32_t number, const Variant& value) { properties_[number] = value; }
 

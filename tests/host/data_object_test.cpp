@@ -200,3 +200,40 @@ TEST_F(DataObjects, CatalogueMessagesAndProperties) {
 
 }  // namespace
 }  // namespace xal::host
+
+namespace xal::host {
+namespace {
+
+class FilterLayer : public testing::HostTest {};
+
+TEST_F(FilterLayer, RelationConditionsAndRawBraces) {
+  conn->db().ExecScript(
+      "INSERT INTO GRArticle (ID, Code) VALUES (1, 'A'), (2, 'B'), (3, 'C');"
+      "INSERT INTO GRArticleCatRel (IDGRArticle, IDGRArticleCat) VALUES (1, 7), (3, 7), (2, 8);"
+      "INSERT INTO SDInvoiceRow (ID, IDDoc) VALUES (50, 1000), (51, 1001);"
+      "INSERT INTO SDInvoiceRowPenalty (ID, IDSDInvoiceRow) VALUES (60, 50), (61, 51), (62, 50);");
+  auto ids = [](const Ref<DataObject>& d) {
+    std::string s;
+    for (d->MoveFirst(); !d->IsEOF(); d->MoveNext()) s += (s.empty() ? "" : ",") + CStr(d->Field("ID"));
+    return s;
+  };
+  struct Row {
+    const char* table;
+    const char* filter;
+    const char* expected;
+  } rows[] = {
+      {"GRArticle", "GRArticleCatRel.IDGRArticleCat = 7", "1,3"},   // a relation table names the rows
+      {"GRArticle", "grarticlecatrel.IDGRArticleCat IN (8)", "2"},
+      {"GRArticle", "GRArticle.Code = 'B'", "2"},                    // the table itself: as given
+      {"SDInvoiceRowPenalty", "{IDSDInvoiceRow IN (SELECT ID FROM SDInvoiceRow WHERE IDDoc = 1000)}", "60,62"},
+      {"GRArticle", "ID = 1 OR ID = 3", "1,3"},                      // a plain condition
+      {"GRArticle", "Code > 'A' AND 1.5 > 1", "2,3"},                // a decimal point is no link
+  };
+  for (const auto& r : rows) {
+    SCOPED_TRACE(r.filter);
+    EXPECT_EQ(ids(conn->Server()->OpenQuery(r.table, 1, r.filter, "")), r.expected);
+  }
+}
+
+}  // namespace
+}  // namespace xal::host
