@@ -11,9 +11,11 @@ install(FILES ${PROJECT_SOURCE_DIR}/include/xalscript/xalscript.h DESTINATION ${
 foreach(f ${XAL_FOLDERS})
   install(TARGETS xal_${f} EXPORT XALScriptTargets)
 endforeach()
-install(TARGETS xalscript EXPORT XALScriptTargets
+install(TARGETS xalscript xalhost EXPORT XALScriptTargets
         LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
         RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/host/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/xalscript/host
+        FILES_MATCHING PATTERN "*.h")
 install(EXPORT XALScriptTargets NAMESPACE XALScript:: DESTINATION ${CMAKE_INSTALL_LIBDIR}/cmake/XALScript)
 
 file(WRITE ${CMAKE_CURRENT_BINARY_DIR}/XALScriptConfig.cmake.in [=[
@@ -21,6 +23,7 @@ file(WRITE ${CMAKE_CURRENT_BINARY_DIR}/XALScriptConfig.cmake.in [=[
 include(CMakeFindDependencyMacro)
 find_dependency(PkgConfig)
 pkg_check_modules(ICU REQUIRED IMPORTED_TARGET icu-uc icu-i18n)
+find_dependency(SQLite3)
 include("${CMAKE_CURRENT_LIST_DIR}/XALScriptTargets.cmake")
 ]=])
 configure_package_config_file(${CMAKE_CURRENT_BINARY_DIR}/XALScriptConfig.cmake.in
@@ -40,7 +43,7 @@ Description: Document logic component of an ERP system
 Version: @PROJECT_VERSION@
 Requires.private: icu-uc icu-i18n
 Libs: -L${libdir} -lxalscript
-Cflags: -I${includedir}/xalscript -std=c++20
+Cflags: -I${includedir}/xalscript -I${includedir} -std=c++20
 ]=])
 configure_file(${CMAKE_CURRENT_BINARY_DIR}/xalscript.pc.in ${CMAKE_CURRENT_BINARY_DIR}/xalscript.pc @ONLY)
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/xalscript.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
