@@ -8,6 +8,8 @@
 #include <cstdlib>
 #include <fstream>
 
+#include <unistd.h>
+
 #include "apps/xal/call_args.h"
 #include "apps/xal/typelib_json.h"
 #include "runtime/member_table.h"
@@ -153,7 +155,9 @@ TEST(TypeLibraryJson, ProbeMembersInInterfaceOrder) {
 std::string RunXal(const std::string& args, const std::string& input = "") {
   const char* bin = std::getenv("XAL_BIN");
   if (!bin) return "no XAL_BIN";
-  std::string inFile = testing::TempDir() + "xal_in.txt";
+  // One input file per test and process: ctest runs tests side by side.
+  const auto* info = testing::UnitTest::GetInstance()->current_test_info();
+  std::string inFile = testing::TempDir() + "xal_in_" + info->name() + "_" + std::to_string(getpid()) + ".txt";
   std::ofstream(inFile) << input;
   std::string cmd = std::string(bin) + "/xal " + args + " < " + inFile + " 2>&1";
   FILE* p = popen(cmd.c_str(), "r");
@@ -162,6 +166,7 @@ std::string RunXal(const std::string& args, const std::string& input = "") {
   size_t n;
   while ((n = fread(buf, 1, sizeof buf, p)) > 0) out.append(buf, n);
   pclose(p);
+  std::remove(inFile.c_str());
   return out;
 }
 
