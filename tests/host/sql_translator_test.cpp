@@ -388,6 +388,23 @@ CREATE TABLE EREmployee (ID INTEGER PRIMARY KEY, Record_state TEXT COLLATE NOCAS
 CREATE TABLE WRPerson (ID INTEGER PRIMARY KEY, IDEREmployee INTEGER, Record_state TEXT COLLATE NOCASE NOT NULL DEFAULT '');
 )sql";
 
+// Prepares and steps one statement through to the end; the error text, or "" on success.
+std::string StepAll(sqlite3* db, const std::string& sql) {
+  sqlite3_stmt* st = nullptr;
+  const char* tail = nullptr;
+  if (sqlite3_prepare_v2(db, sql.c_str(), -1, &st, &tail) != SQLITE_OK) return sqlite3_errmsg(db);
+  if (tail && std::string_view(tail).find_first_not_of(" \r\n\t;") != std::string_view::npos) {
+    sqlite3_finalize(st);
+    return "more than one statement";
+  }
+  int rc;
+  while ((rc = sqlite3_step(st)) == SQLITE_ROW) {
+  }
+  std::string msg = rc == SQLITE_DONE ? "" : sqlite3_errmsg(db);
+  sqlite3_finalize(st);
+  return msg;
+}
+
 class ScratchDb {
  public:
   ScratchDb() {
@@ -410,22 +427,7 @@ class ScratchDb {
     return msg;
   }
 
-  // Prepares and steps one statement through to the end; the error text, or "" on success.
-  std::string Run(const std::string& sql) {
-    sqlite3_stmt* st = nullptr;
-    const char* tail = nullptr;
-    if (sqlite3_prepare_v2(db_, sql.c_str(), -1, &st, &tail) != SQLITE_OK) return sqlite3_errmsg(db_);
-    if (tail && std::string_view(tail).find_first_not_of(" \r\n\t;") != std::string_view::npos) {
-      sqlite3_finalize(st);
-      return "more than one statement";
-    }
-    int rc;
-    while ((rc = sqlite3_step(st)) == SQLITE_ROW) {
-    }
-    std::string msg = rc == SQLITE_DONE ? "" : sqlite3_errmsg(db_);
-    sqlite3_finalize(st);
-    return msg;
-  }
+  std::string Run(const std::string& sql) { return StepAll(db_, sql); }
 
   // The first column of every row, as text ("NULL" for Null).
   std::vector<std::string> Column(const std::string& sql) {
@@ -748,11 +750,9 @@ std::vector<Statement> Inventory() {
   };
 }
 
-class InventoryTest : public testing::TestWithParam<int> {};
-
-TEST_P(InventoryTest, EveryStatementRunsOnSqlite) {
-  const int kind = GetParam();
-  ScratchDb db;
+// Translates every statement of the inventory for `kind` and runs it, in order (a work table one
+// statement creates is used by the next ones), on `db`; each must run.
+void RunInventory(int kind, sqlite3* db) {
   int ran = 0;
   for (const Statement& s : Inventory()) {
     if (!(s.kinds & (kind == 2 ? 2 : 1))) continue;
@@ -765,10 +765,18 @@ TEST_P(InventoryTest, EveryStatementRunsOnSqlite) {
       continue;
     }
     if (s.table) sql = std::string("SELECT * FROM ") + s.table + " WHERE " + sql;
-    EXPECT_EQ(db.Run(sql), "") << sql;
+    EXPECT_EQ(StepAll(db, sql), "") << sql;
     ++ran;
   }
   EXPECT_GT(ran, 50);
+}
+
+class InventoryTest : public testing::TestWithParam<int> {};
+
+TEST_P(InventoryTest, EveryStatementRunsOnSqlite) {
+  const int kind = GetParam();
+  ScratchDb db;
+  RunInventory(kind, db.db());
 }
 
 INSTANTIATE_TEST_SUITE_P(BothKinds, InventoryTest, testing::Values(1, 2),
@@ -872,35 +880,7 @@ TEST_P(InventoryOnHostSchemaTest, EveryStatementRunsOnTheDemoDatabase) {
   const std::string path = testing::TempDir() + "xal_inventory_" + std::to_string(kind) + ".db";
   std::remove(path.c_str());
   Ref<HostConnection> conn = OpenDemoDatabase(path, kind);
-  sqlite3* db = conn->db().handle();
-  int ran = 0;
-  for (const Statement& s : Inventory()) {
-    if (!(s.kinds & (kind == 2 ? 2 : 1))) continue;
-    SCOPED_TRACE(testing::Message() << s.code << " kind " << kind << ": " << s.sql);
-    std::string sql;
-    try {
-      sql = TranslateToSqlite(s.sql, kind);
-    } catch (const VbError& e) {
-      ADD_FAILURE() << "refused: " << e.description();
-      continue;
-    }
-    if (s.table) sql = std::string("SELECT * FROM ") + s.table + " WHERE " + sql;
-    // In order: a work table one statement creates is used by the next ones.
-    sqlite3_stmt* st = nullptr;
-    std::string error;
-    if (sqlite3_prepare_v2(db, sql.c_str(), -1, &st, nullptr) != SQLITE_OK) {
-      error = sqlite3_errmsg(db);
-    } else {
-      int rc;
-      while ((rc = sqlite3_step(st)) == SQLITE_ROW) {
-      }
-      if (rc != SQLITE_DONE) error = sqlite3_errmsg(db);
-    }
-    sqlite3_finalize(st);
-    EXPECT_EQ(error, "") << sql;
-    ++ran;
-  }
-  EXPECT_GT(ran, 50);
+  RunInventory(kind, conn->db().handle());
   conn.reset();
   std::remove(path.c_str());
 }
