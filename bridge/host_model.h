@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <string>
 
+#include "collections/ui_strings.h"
 #include "runtime/object.h"
 #include "runtime/variant.h"
 
@@ -17,11 +18,50 @@ class XALConnect;
 class XALServer;
 class ParamList;
 
+// ---------------------------------------------------------------------------------------------
+// The host's numbers. The host's type library passes its enumerations through as integers; these
+// names are the only place the component spells them out.
+// ---------------------------------------------------------------------------------------------
+
+// XALConnect::DatabaseKind: which SQL dialect the connection speaks.
+enum DatabaseKind : int32_t {
+  kDbFile = 1,    // the file database (the host answers any value but 2 for it)
+  kDbServer = 2,  // the SQL server
+};
+// True when the connection's kind asks for the SQL server dialect; every other value is the file
+// database, as the host documents it.
+inline bool IsServerDialect(int32_t kind) { return kind == kDbServer; }
+
 // Row states the component tests with DataObject::RowState.
-constexpr int32_t kRowMarkedDeleted = 16;
-constexpr int32_t kRowNotStored = 17;
-// DataObject::Property numbers the component reads.
-constexpr int32_t kPropTableName = 14;
+constexpr int32_t kRowMarkedDeleted = 16;  // the user marked the row deleted; it is saved as a delete
+constexpr int32_t kRowNotStored = 17;      // the row was added and has no stored record yet
+
+// DataObject::Property numbers.
+constexpr int32_t kPropTableName = 14;  // the table behind the data object
+constexpr int32_t kPropLastError = 37;  // the text of the last failed host operation ("" after success)
+// XALConnect::Property numbers.
+constexpr int32_t kConnPropLanguage = 8;  // the user's language identifier (see LanguageID)
+// XALServer::Property numbers.
+constexpr int32_t kServerPropLanguage = 5;       // the language identifier of the server's texts
+constexpr int32_t kServerPropRowRights = 8;      // row-level rights are in force
+constexpr int32_t kServerPropRowRightsAlt = 50;  // row-level rights are in force (second switch)
+
+// XALServer::OpenQuery modes: how the host opens the result. The reference host treats them alike;
+// a real host uses them to choose cursor and locking.
+enum QueryMode : int32_t {
+  kQueryEditable = 1,  // an updatable, positioned result (the row may be written back)
+  kQueryReadOnly = 3,  // a read-only snapshot
+  kQueryForward = 4,   // read once from the first row on (counts, existence tests)
+  kQueryServer = 11,   // run on the server as written, no client-side rewrite (server dialect)
+};
+
+// Language identifiers the host reports (connection property 8, server property 5) are the UI
+// string table's columns: kLangEnglish 3, kLangEstonian 4, kLangThird 5; any other reads English.
+using LanguageID = UILanguage;
+
+// XALConnect::CheckRight: the user right asked for with kind "DOCUMENT".
+constexpr int32_t kRightNone = 0;      // argument a: no sub-right
+constexpr int32_t kRightExecute = 4;   // argument b: may run the document's special functions
 
 class DataObject : public Object {
  public:
@@ -40,7 +80,9 @@ class DataObject : public Object {
   virtual void Delete() = 0;  // deleting moves on to the next row
   virtual Variant Bookmark() = 0;
   virtual void GoToBookmark(const Variant& bookmark) = 0;
-  // Stores the current row; the three flags are passed through to the host's update.
+  // Writes the current row back to the form. a: refresh the row on the screen from the data;
+  // b: run the host's own field validations for it; c: the row set is empty and only the form's
+  // view of it is to be refreshed (used after deleting the last cached sub-row).
   virtual void UpdateRow(bool a, bool b, bool c) = 0;
   // True when the current row is in state `state` (16 marked deleted, 17 not stored yet).
   virtual bool RowState(int32_t state) = 0;
@@ -70,7 +112,8 @@ class XALConnect : public Object {
   // Runs an SQL statement; the result is the number of rows it affected where the host knows it.
   virtual Variant Execute(const std::string& sql, int32_t options) = 0;
   virtual Variant ServerCommand(const std::string& name, const Ref<ParamList>& params) = 0;
-  // Whether `user` may do `a`/`b` on `object` of `kind` ("DOCUMENT", table, 0, 4).
+  // Whether `user` holds a right on `object` of `kind` ("DOCUMENT", table name): `a` names a
+  // sub-right (0: none), `b` the right itself as a bit (4: may run the object's special functions).
   virtual bool CheckRight(int32_t user, const std::string& kind, const std::string& object, int32_t a,
                           int32_t b) = 0;
   virtual bool LogCheck(const std::string& kind, const std::string& table, int32_t flags) = 0;
@@ -86,7 +129,8 @@ class XALConnect : public Object {
 
 class XALServer : public Object {
  public:
-  // A query (SQL text or a table name) positioned on its first row.
+  // A query (SQL text or a table name) positioned on its first row; `mode` is a QueryMode, `filter` a
+  // condition added to a table query, `fields` the columns to read ("" all).
   virtual Ref<DataObject> OpenQuery(const std::string& sqlOrTable, int32_t mode, const std::string& filter,
                                     const std::string& fields) = 0;
   virtual Ref<DataObject> OpenDataObject(const std::string& table) = 0;
@@ -129,11 +173,15 @@ class IXALCallback : public Object {
   virtual bool InputBox(int32_t callerID, Ref<ParamList>& Params, int32_t Buttons, const std::string& Title) = 0;
 };
 
-// Message-box buttons and answers.
+// Message-box buttons (added together) and answers.
 constexpr int32_t kMbOK = 0;
 constexpr int32_t kMbYesNo = 4;
-constexpr int32_t kMbYesNoDefaultNo = 260;
+constexpr int32_t kMbButtonsMask = 7;      // the buttons part of a Buttons value
+constexpr int32_t kMbDefaultSecond = 256;  // the second button is preselected
+constexpr int32_t kMbYesNoDefaultNo = kMbYesNo + kMbDefaultSecond;
 constexpr int32_t kMbInformation = 64;
+constexpr int32_t kAnswerOK = 1;
+constexpr int32_t kAnswerCancel = 2;
 constexpr int32_t kAnswerYes = 6;
 constexpr int32_t kAnswerNo = 7;
 

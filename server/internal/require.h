@@ -1,18 +1,9 @@
-// Access to the host objects the server module is handed: the original runtime raised error 91
-// when a routine used an object variable that was Nothing, and the module's error trapping relies
-// on that error rather than on a crash.
+// Access to the host objects the server module is handed goes through xal::Require (runtime/trap.h):
+// a Nothing reference raises error 91, which the module's error trapping relies on.
 #pragma once
 
-#include "runtime/error.h"
-#include "runtime/object.h"
+#include "runtime/trap.h"
 
 namespace xal::server::internal {
-
-// The object behind `p`, or error 91 when it is Nothing.
-template <class T>
-T& Require(const Ref<T>& p) {
-  if (!p) Raise(kErrObjectNotSet);
-  return *p;
-}
-
+using xal::Require;
 }  // namespace xal::server::internal
