@@ -2,6 +2,7 @@
 #include "host/document_session.h"
 
 #include "host/param_list.h"
+#include "host/schema.h"
 #include "runtime/collection.h"
 #include "runtime/convert.h"
 #include "runtime/text.h"
@@ -11,15 +12,6 @@ namespace xal::host {
 namespace {
 
 std::string Q(const std::string& s) { return "\"" + s + "\""; }
-
-// The column of a row table that names its document.
-std::string DocLinkColumn(HostConnection& conn, const std::string& rowTable) {
-  for (const std::string& c : conn.db().TableColumns(rowTable))
-    if (TextEquals(c, "IDDoc")) return c;
-  for (const std::string& c : conn.db().TableColumns(rowTable))
-    if (TextEquals(c, "IDVDVoucher")) return c;
-  return "IDDoc";
-}
 
 std::string ArgText(const Variant& v) {
   if (v.IsString()) return "\"" + v.AsString() + "\"";
@@ -79,8 +71,10 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
   }
+  // A row is new until it is stored: the rows' current row in state 17.
   void DoOnNewRow(bool& RetVal) override {
-    RetVal = true;
+    auto s = session_.lock();
+    RetVal = s && s->rows_ && s->rows_->RowState(kRowNotStored);
     Log("OnNewRow()");
   }
   void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {
@@ -178,7 +172,7 @@ Ref<DocumentSession> DocumentSession::Open(const Ref<HostConnection>& conn, cons
   s->savedHeader_ = conn->OpenRows(headerSql, docTable, "", {Variant(id)});
   s->header_->SetOwner(s->savedHeader_);
   if (id == 0) s->header_->AddNew();
-  const std::string link = DocLinkColumn(*conn, s->rowTable_);
+  const std::string link = DocumentLinkColumn(s->rowTable_);
   std::string rowSql = "SELECT * FROM " + Q(s->rowTable_) + " WHERE " + link + " = ?";
   for (const std::string& c : conn->db().TableColumns(s->rowTable_))
     if (TextEquals(c, "IDParentRow")) rowSql += " AND IDParentRow = 0";
@@ -273,7 +267,7 @@ int32_t DocumentSession::Save() {
   header_->UpdateRow(false, false, false);
   const Variant docID = header_->Field("ID");
   const bool storeRows = TextEquals(rowTable_, "DDStoreDRow");
-  const std::string link = DocLinkColumn(*conn_, rowTable_);
+  const std::string link = DocumentLinkColumn(rowTable_);
   auto stamp = [&](HostDataObject& rows) {
     for (rows.MoveFirst(); !rows.IsEOF(); rows.MoveNext()) {
       if (rows.RowState(kRowMarkedDeleted)) continue;
