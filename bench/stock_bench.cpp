@@ -7,6 +7,7 @@
 #include <string>
 
 #include "host/connection.h"
+#include "host/kept_balances.h"
 #include "runtime/dates.h"
 #include "server/stock.h"
 
@@ -20,19 +21,17 @@ xal::Ref<xal::host::HostConnection> StockDb(int32_t kind, int64_t rows, bool clo
                      (closed ? "_c" : "") + ".db");
   std::filesystem::remove(path);
   auto conn = xal::host::HostConnection::Open(path.string(), kind);
-  auto& db = conn->db();
   const double start = xal::DateSerial(2009, 1, 1).serial;
-  // The current balances are rebuilt once at the end rather than by the trigger on every insert.
-  db.ExecScript("DROP TRIGGER DDStoreDRow_bal_ai; BEGIN");
-  for (int64_t i = 0; i < rows; ++i) {
-    const char* sender = (i % 3 == 0) ? "NULL" : (i % 3 == 1 ? "1" : "2");
-    const char* receiver = (i % 3 == 0) ? "1" : (i % 3 == 1 ? "2" : "NULL");
-    db.Exec("INSERT INTO DDStoreDRow (IDDoc, IDGRArticle, IDSenderStore, IDReceiverStore, BaseQuantity, Cost, "
-            "DocDate) VALUES (1, 1, " + std::string(sender) + ", " + receiver + ", ?, ?, ?)",
-            {xal::Variant(double(1 + i % 5)), xal::Variant(double(2 + i % 7)),
-             xal::Variant(xal::Date(start + double(i % 365)))});
-  }
-  if (closed) {
+  xal::host::LoadInBulk(*conn, [&](xal::host::Database& db) {
+    for (int64_t i = 0; i < rows; ++i) {
+      const char* sender = (i % 3 == 0) ? "NULL" : (i % 3 == 1 ? "1" : "2");
+      const char* receiver = (i % 3 == 0) ? "1" : (i % 3 == 1 ? "2" : "NULL");
+      db.Exec("INSERT INTO DDStoreDRow (IDDoc, IDGRArticle, IDSenderStore, IDReceiverStore, BaseQuantity, Cost, "
+              "DocDate) VALUES (1, 1, " + std::string(sender) + ", " + receiver + ", ?, ?, ?)",
+              {xal::Variant(double(1 + i % 5)), xal::Variant(double(2 + i % 7)),
+               xal::Variant(xal::Date(start + double(i % 365)))});
+    }
+    if (!closed) return;
     const std::string d = std::to_string(static_cast<int>(xal::DateSerial(2009, 7, 1).serial));
     db.ExecScript("INSERT INTO DBalanceStore (DocDate, IDGRArticle, IDDRStore, DebitQFlow, CreditQFlow) "
                   "SELECT DocDate, IDGRArticle, St, total(DQ), total(CQ) FROM ("
@@ -40,10 +39,8 @@ xal::Ref<xal::host::HostConnection> StockDb(int32_t kind, int64_t rows, bool clo
                   "WHERE IDReceiverStore IS NOT NULL AND DocDate < " + d +
                   " UNION ALL SELECT DocDate, IDGRArticle, IDSenderStore, 0, BaseQuantity FROM DDStoreDRow "
                   "WHERE IDSenderStore IS NOT NULL AND DocDate < " + d + ") GROUP BY 1, 2, 3;");
-    conn->SetSetting("DateFixed", "Store", xal::Variant(xal::DateSerial(2009, 7, 1)));
-  }
-  db.ExecScript("COMMIT");
-  conn->ServerCommand("Update_DCurBalance", nullptr);
+  });
+  if (closed) conn->SetSetting("DateFixed", "Store", xal::Variant(xal::DateSerial(2009, 7, 1)));
   return conn;
 }
 

@@ -1,11 +1,16 @@
 // HostConnection and HostServer over SQLite.
 #include "host/connection.h"
 
+#include <unistd.h>
+
 #include <atomic>
 
 #include "host/data_object.h"
 #include "host/host_error.h"
+#include "host/inventory.h"
+#include "host/kept_balances.h"
 #include "host/param_list.h"
+#include "host/schema.h"
 #include "host/sql_translator.h"
 #include "runtime/convert.h"
 #include "runtime/dates.h"
@@ -13,10 +18,12 @@
 
 namespace xal::host {
 
-extern const char kSchemaSql[];
-
 namespace {
 std::atomic<int64_t> gNextSession{1};
+
+// Session numbers hold locks in a database that other processes open too, so they carry the
+// process id above the process's own count.
+int64_t NewSessionNumber() { return (static_cast<int64_t>(getpid()) << 24) + gNextSession++; }
 
 // The text an option is stored as: numbers in "." form, dates as serials, Booleans as -1/0, so
 // that what is read back converts to the same value in any locale.
@@ -36,7 +43,7 @@ std::string StoredText(const Variant& v) {
 // ---------------------------------------------------------------------------------------------
 
 HostConnection::HostConnection(std::shared_ptr<Database> db, int32_t kind, int32_t userID)
-    : db_(std::move(db)), kind_(kind), userID_(userID), session_(gNextSession++) {}
+    : db_(std::move(db)), kind_(kind), userID_(userID), session_(NewSessionNumber()) {}
 
 HostConnection::~HostConnection() {
   // Locks die with their holder, as a server drops a session's locks when it disconnects.
@@ -52,7 +59,7 @@ Ref<HostConnection> HostConnection::Open(const std::string& path, int32_t kind, 
     // One transaction for the whole schema: a file database would otherwise sync every statement.
     db->ExecScript("BEGIN");
     try {
-      db->ExecScript(kSchemaSql);
+      CreateSchema(*db);
       db->ExecScript("COMMIT");
     } catch (const VbError&) {
       db->ExecScript("ROLLBACK");
@@ -116,35 +123,47 @@ Variant HostConnection::Execute(const std::string& sql, int32_t) {
   }
 }
 
+// Server locks ("Lock" / "UnLock", ParamList "XALType", "LockType", "ID"):
+//   1. A lock is named by its kind ("XALType", required), its type ("LockType", a number, 0 when
+//      missing) and its record ("ID"; missing, Empty or 0 lock the whole kind).
+//   2. "Lock" takes the lock and answers True, unless another connection holds it, or holds the
+//      whole kind (same type) while a record is asked, or any record of it while the whole kind is
+//      asked: then False. Asking again for a lock one holds answers True. Check and take are one
+//      statement, so two connections can never both win.
+//   3. "UnLock" releases this connection's lock of that name and answers True; with a record it
+//      also releases this connection's lock on the whole kind (same type): saving the document is
+//      the end of the work such a lock guards ("Add lots" locks the kind, then saves). Another
+//      connection's lock is never released.
+//   4. A connection's locks end with the connection.
 Variant HostConnection::Lock(const Ref<ParamList>& params, bool take) {
-  std::string name = params ? CStr(params->Item("XALType")) + "/" + CStr(params->Item("LockType")) : "";
-  if (params && params->Exists("ID")) name += "/" + CStr(params->Item("ID"));
+  const std::string kind = params ? Trim(CStr(params->Item("XALType"))) : "";
+  if (kind.empty()) Raise(kErrInvalidCall, std::string(take ? "Lock" : "UnLock") + " needs an XALType");
+  const Variant type(CLng(params->Item("LockType")));
+  const Variant record(CLng(params->Item("ID")));
   const Variant me(static_cast<double>(session_));
   if (!take) {
-    db_->Exec("DELETE FROM XALLock WHERE Name = ? AND Holder = ?", {Variant(name), me});
+    db_->Exec("DELETE FROM XALLock WHERE XALType = ?1 AND LockType = ?2 AND Holder = ?4 "
+              "AND (IDRecord = ?3 OR IDRecord = 0)",
+              {Variant(kind), type, record, me});
     return Variant(true);
   }
-  Variant holder = db_->Scalar("SELECT Holder FROM XALLock WHERE Name = ?", {Variant(name)});
-  if (!holder.IsNull()) return Variant(CDbl(holder) == static_cast<double>(session_));
-  db_->Exec("INSERT INTO XALLock (Name, Holder, TakenAt) VALUES (?, ?, ?)", {Variant(name), me, Variant(Now())});
-  return Variant(true);
+  db_->Exec("INSERT INTO XALLock (XALType, LockType, IDRecord, Holder, TakenAt) SELECT ?1, ?2, ?3, ?4, ?5 "
+            "WHERE NOT EXISTS (SELECT 1 FROM XALLock WHERE XALType = ?1 AND LockType = ?2 AND Holder <> ?4 "
+            "AND (IDRecord = ?3 OR IDRecord = 0 OR ?3 = 0)) ON CONFLICT DO NOTHING",
+            {Variant(kind), type, record, me, Variant(Now())});
+  const Variant holder = db_->Scalar("SELECT Holder FROM XALLock WHERE XALType = ? AND LockType = ? AND IDRecord = ?",
+                                     {Variant(kind), type, record});
+  return Variant(!holder.IsNull() && CDbl(holder) == static_cast<double>(session_));
 }
 
 Variant HostConnection::ServerCommand(const std::string& name, const Ref<ParamList>& params) {
   if (TextEquals(name, "Lock")) return Lock(params, true);
   if (TextEquals(name, "UnLock")) return Lock(params, false);
+  if (TextEquals(name, "DPInventoryB")) return InventoryB(*this, params);
   if (TextEquals(name, "Update_DCurBalance")) {
     // Rebuilds the current balances of the rows a field value selects (or all of them).
-    std::string field = params ? CStr(params->Item("FieldName")) : "";
-    std::string where = field.empty() ? "" : " WHERE " + field + " = ?";
-    std::vector<Variant> args;
-    if (!field.empty()) args.push_back(params->Item("FieldValue"));
-    if (!field.empty() && !TextEquals(field, "IDGRArticle") && !TextEquals(field, "IDDRStore"))
-      Raise(kErrInvalidCall, "Update_DCurBalance: unknown field " + field);
-    std::string keyWhere = field.empty() ? "" : (TextEquals(field, "IDDRStore") ? " WHERE IDDRStore = ?" : where);
-    db_->Exec("DELETE FROM DCurBalanceStore" + keyWhere, args);
-    db_->Exec("INSERT INTO DCurBalanceStore SELECT *, CASE WHEN Quantity + RQuantity <> 0 THEN AmountBase / "
-              "(Quantity + RQuantity) ELSE 0 END FROM vCurBalanceStore" + keyWhere, args);
+    const std::string field = params ? CStr(params->Item("FieldName")) : "";
+    RebuildStockBalances(*db_, field, field.empty() ? Variant() : params->Item("FieldValue"));
     InvalidateLinks();
     return Variant(true);
   }
@@ -169,9 +188,12 @@ bool HostConnection::CheckRight(int32_t user, const std::string& kind, const std
   return (CLng(denied) & b) == 0;
 }
 
-bool HostConnection::LogCheck(const std::string& kind, const std::string& table, int32_t) {
-  Variant n = db_->Scalar("SELECT count(*) FROM XALLogTable WHERE TableName = ? AND (Kind = ? OR Kind = '')",
-                          {Variant(table), Variant(kind)});
+// Logged when XALLogTable lists the table for this kind (or for every kind, Kind '') with one of
+// the operation bits `flags` asks about (0: any).
+bool HostConnection::LogCheck(const std::string& kind, const std::string& table, int32_t flags) {
+  Variant n = db_->Scalar("SELECT count(*) FROM XALLogTable WHERE TableName = ? AND (Kind = ? OR Kind = '') "
+                          "AND (?3 = 0 OR (Flags & ?3) <> 0)",
+                          {Variant(table), Variant(kind), Variant(flags)});
   return CLng(n) > 0;
 }
 

@@ -80,7 +80,6 @@ void HostDataObject::Reload(ResultSet rs) {
     rows_.push_back(std::move(r));
   }
   current_ = 0;
-  bof_ = rows_.empty();
 }
 
 int HostDataObject::ColumnIndex(const std::string& name) const {
@@ -156,22 +155,20 @@ void HostDataObject::SetField(const std::string& name, const Variant& value) {
 
 void HostDataObject::MoveFirst() {
   current_ = 0;
-  bof_ = rows_.empty();
 }
 
 void HostDataObject::MoveNext() {
   if (current_ < rows_.size()) ++current_;
-  bof_ = false;
 }
 
-Variant HostDataObject::Bookmark() { return Variant(CurrentRow().serial); }
+// Without a current row there is nothing to mark: Empty, which GoToBookmark refuses.
+Variant HostDataObject::Bookmark() { return IsEOF() ? Variant() : Variant(rows_[current_].serial); }
 
 void HostDataObject::GoToBookmark(const Variant& bookmark) {
   int32_t serial = CLng(bookmark);
   for (size_t i = 0; i < rows_.size(); ++i)
     if (rows_[i].serial == serial) {
       current_ = i;
-      bof_ = false;
       return;
     }
   Raise(kErrBadBookmark, "Not a valid bookmark.");
@@ -197,7 +194,6 @@ int32_t HostDataObject::FindFirst(const std::string& condition, int32_t) {
     if (sqlite3_step(stmt) == SQLITE_ROW && sqlite3_column_type(stmt, 0) != SQLITE_NULL &&
         sqlite3_column_double(stmt, 0) != 0) {
       current_ = r;
-      bof_ = false;
       result = 0;
     }
   }
@@ -217,7 +213,6 @@ void HostDataObject::AddNew() {
   r.serial = nextSerial_++;
   rows_.push_back(std::move(r));
   current_ = rows_.size() - 1;
-  bof_ = false;
 }
 
 void HostDataObject::Delete() {

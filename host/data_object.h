@@ -33,8 +33,10 @@ class HostDataObject : public DataObject {
   void SetField(const std::string& name, const Variant& value) override;
   void MoveFirst() override;
   void MoveNext() override;
+  // No current row: past the last row, or none at all.
   bool IsEOF() override { return current_ >= rows_.size(); }
-  bool IsBOF() override { return bof_; }
+  // Before the first row: the only way to stand there is a set without rows (nothing moves back).
+  bool IsBOF() override { return rows_.empty(); }
   int32_t RowCount() override { return static_cast<int32_t>(rows_.size()); }
   int32_t FindFirst(const std::string& condition, int32_t mode) override;
   void AddNew() override;
@@ -89,7 +91,6 @@ class HostDataObject : public DataObject {
   std::unordered_map<std::string, int> columnIndex_;  // folded name -> index
   std::vector<Row> rows_;
   size_t current_ = 0;
-  bool bof_ = false;
   int32_t nextSerial_ = 1;
 };
 

@@ -19,6 +19,11 @@ namespace {
   Raise(kErrSql, msg + " [" + std::string(sql.substr(0, 400)) + "]");
 }
 
+// keeps_balances(): the switch of the kept-balance triggers, one per connection.
+void KeepsBalancesFn(sqlite3_context* ctx, int, sqlite3_value**) {
+  sqlite3_result_int(ctx, static_cast<const Database*>(sqlite3_user_data(ctx))->KeepsBalances() ? 1 : 0);
+}
+
 bool StartsWithNoCase(const char* s, const char* prefix) {
   for (; *prefix; ++s, ++prefix)
     if (!*s || std::toupper(static_cast<unsigned char>(*s)) != *prefix) return false;
@@ -26,19 +31,45 @@ bool StartsWithNoCase(const char* s, const char* prefix) {
 }
 }  // namespace
 
-// Prepared statement owner.
+// A prepared statement for one run: taken from the cache when its text is there, reset and handed
+// back (or finalized, when the cache already holds another of the same text) when the run ends.
 struct Database::Stmt {
+  static constexpr size_t kMaxCached = 200;
+  Database& owner;
+  std::string text;
   sqlite3_stmt* s = nullptr;
-  Stmt(sqlite3* db, std::string_view sql) {
+  Stmt(Database& db, std::string_view sql) : owner(db), text(sql) {
+    auto it = owner.statements_.find(text);
+    if (it != owner.statements_.end()) {
+      s = it->second;
+      owner.statements_.erase(it);
+      return;
+    }
     const char* tail = nullptr;
-    if (sqlite3_prepare_v2(db, sql.data(), static_cast<int>(sql.size()), &s, &tail) != SQLITE_OK) Fail(db, sql);
+    if (sqlite3_prepare_v3(owner.db_, sql.data(), static_cast<int>(sql.size()), SQLITE_PREPARE_PERSISTENT, &s,
+                           &tail) != SQLITE_OK)
+      Fail(owner.db_, sql);
     if (!s) Raise(kErrSql, "empty SQL statement");
   }
-  ~Stmt() { sqlite3_finalize(s); }
+  ~Stmt() {
+    sqlite3_reset(s);
+    sqlite3_clear_bindings(s);
+    if (owner.statements_.count(text)) {
+      sqlite3_finalize(s);
+      return;
+    }
+    if (owner.statements_.size() >= kMaxCached) owner.ClearStatements();
+    owner.statements_.emplace(std::move(text), s);
+  }
   void Bind(const std::vector<Variant>& params) {
     for (size_t i = 0; i < params.size(); ++i) BindVariant(s, static_cast<int>(i + 1), params[i]);
   }
 };
+
+void Database::ClearStatements() {
+  for (auto& [text, stmt] : statements_) sqlite3_finalize(stmt);
+  statements_.clear();
+}
 
 ColumnKind KindFromDeclType(const char* d) {
   if (!d) return ColumnKind::Auto;
@@ -110,10 +141,15 @@ Database::Database(const std::string& path) : path_(path) {
   sqlite3_db_config(db_, SQLITE_DBCONFIG_DQS_DDL, 0, nullptr);
   sqlite3_busy_timeout(db_, 2000);
   RegisterSqlFunctions(db_);
+  sqlite3_create_function_v2(db_, "keeps_balances", 0, SQLITE_UTF8 | SQLITE_INNOCUOUS, this, KeepsBalancesFn, nullptr,
+                             nullptr, nullptr);
   ExecScript("PRAGMA foreign_keys = OFF; PRAGMA recursive_triggers = ON; PRAGMA journal_mode = WAL; PRAGMA synchronous = NORMAL;");
 }
 
-Database::~Database() { sqlite3_close(db_); }
+Database::~Database() {
+  ClearStatements();
+  sqlite3_close(db_);
+}
 
 void Database::ExecScript(std::string_view sql) {
   std::string text(sql);
@@ -126,7 +162,7 @@ void Database::ExecScript(std::string_view sql) {
 }
 
 int64_t Database::Exec(std::string_view sql, const std::vector<Variant>& params) {
-  Stmt st(db_, sql);
+  Stmt st(*this, sql);
   st.Bind(params);
   int rc;
   while ((rc = sqlite3_step(st.s)) == SQLITE_ROW) {
@@ -136,7 +172,7 @@ int64_t Database::Exec(std::string_view sql, const std::vector<Variant>& params)
 }
 
 ResultSet Database::Query(std::string_view sql, const std::vector<Variant>& params) {
-  Stmt st(db_, sql);
+  Stmt st(*this, sql);
   st.Bind(params);
   ResultSet rs;
   const int n = sqlite3_column_count(st.s);

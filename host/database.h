@@ -7,6 +7,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 #include "runtime/variant.h"
@@ -49,11 +50,20 @@ class Database {
   std::vector<std::string> TableColumns(std::string_view table);
   sqlite3* handle() const { return db_; }
   const std::string& path() const { return path_; }
+  // What the schema's keeps_balances() answers: whether the triggers keep the current balances
+  // (off only while a bulk load runs, see host/kept_balances.h).
+  bool KeepsBalances() const { return keepsBalances_; }
+  void SetKeepsBalances(bool on) { keepsBalances_ = on; }
 
  private:
   struct Stmt;
+  void ClearStatements();
   sqlite3* db_ = nullptr;
+  // Prepared statements by their text, kept for the next run of the same text (compiling a
+  // statement with its triggers costs more than running it); out of the map while one runs.
+  std::unordered_map<std::string, sqlite3_stmt*> statements_;
   std::string path_;
+  bool keepsBalances_ = true;
 };
 
 // Converts a Variant to what SQLite stores: dates as serial days, currency as REAL, Booleans as

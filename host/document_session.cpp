@@ -3,6 +3,7 @@
 
 #include "host/event_transcript.h"
 #include "host/param_list.h"
+#include "host/schema.h"
 #include "runtime/collection.h"
 #include "runtime/convert.h"
 #include "runtime/text.h"
@@ -60,7 +61,11 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
   }
-  void DoOnNewRow(bool& RetVal) override { RetVal = true; }
+  // A row is new until it is stored: the rows' current row in state 17.
+  void DoOnNewRow(bool& RetVal) override {
+    auto s = session_.lock();
+    RetVal = s && s->rows_ && s->rows_->RowState(kRowNotStored);
+  }
   void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {
     auto s = session_.lock();
     if (!s) return;
@@ -120,7 +125,7 @@ Ref<DocumentSession> DocumentSession::Open(const Ref<HostConnection>& conn, cons
   s->savedHeader_ = conn->OpenRows(headerSql, docTable, "", {Variant(id)});
   s->header_->SetOwner(s->savedHeader_);
   if (id == 0) s->header_->AddNew();
-  const std::string link = DocLinkColumn(*conn, s->rowTable_);
+  const std::string link = DocumentLinkColumn(s->rowTable_);
   std::string rowSql = "SELECT * FROM " + Q(s->rowTable_) + " WHERE " + link + " = ?";
   for (const std::string& c : conn->db().TableColumns(s->rowTable_))
     if (TextEquals(c, "IDParentRow")) rowSql += " AND IDParentRow = 0";
@@ -221,7 +226,7 @@ int32_t DocumentSession::Save() {
   header_->UpdateRow(false, false, false);
   const Variant docID = header_->Field("ID");
   const bool storeRows = TextEquals(rowTable_, "DDStoreDRow");
-  const std::string link = DocLinkColumn(*conn_, rowTable_);
+  const std::string link = DocumentLinkColumn(rowTable_);
   auto stamp = [&](HostDataObject& rows) {
     for (rows.MoveFirst(); !rows.IsEOF(); rows.MoveNext()) {
       if (rows.RowState(kRowMarkedDeleted)) continue;
