@@ -196,6 +196,7 @@ Ref<DocumentSession> DocumentSession::Open(const Ref<HostConnection>& conn, cons
 DocumentSession::~DocumentSession() { Close(); }
 
 void DocumentSession::Close() {
+  ReleaseDocFunc();
   if (proxy_) proxy_->Destroy();
   proxy_.reset();
   caches_.clear();
