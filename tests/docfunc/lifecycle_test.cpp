@@ -153,7 +153,8 @@ TEST_F(Lifecycle, EmptyRowsAreDroppedAndSetsNeedTheirParts) {
   AddRow({{"IDGRArticle", Variant(3)}, {"CompletionType", Variant("C")}, {"Amount", Variant(5)}});  // a set, no parts
   AddRow({{"IDGRArticle", Variant(1)}, {"AltQuantity", Variant(1.0)}});      // kept
   EXPECT_EQ(Handler("VDocument"), Variant(false));
-  EXPECT_EQ(session->TranscriptText(), "MsgBox(\"Set rows are missing 'KIT'\",0)->1");
+  EXPECT_EQ(session->TranscriptText(),
+            "CachedRows(\"SDINVOICERow\",\"Next\"); MsgBox(\"Set rows are missing 'KIT'\",0)->1");
   auto rows = std::static_pointer_cast<host::HostDataObject>(session->Rows());
   EXPECT_EQ(rows->ActualRowCount(), 3);
   rows->MoveFirst();
