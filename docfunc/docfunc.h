@@ -1,0 +1,152 @@
+// DocFunc: the document logic behind one open document form. The host hands it the form's script
+// proxy (Doc), the form's data object (DocData) and the server object (XALServer) and calls
+// Create, which configures the object for the kind of document; from then on the form's scripts
+// call its handlers by name — lifecycle handlers, field handlers (V… after a field was entered,
+// W… before it is edited, D… defaults), and commands registered as menu items.
+// Every handler runs through one template (docfunc/handler.h): errors end the handler, are shown
+// in the status line and never reach the script; refreshes and totals are deferred to the
+// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp.
+// Ownership: the object holds Refs to the proxy, the data objects, the connection and the server
+// until Destroy releases them; the host keeps its own references.
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+#include "bridge/host_model.h"
+#include "bridge/proxy.h"
+#include "docfunc/state.h"
+#include "runtime/trap.h"
+#include "runtime/variant.h"
+
+namespace xal {
+
+// The tax sums stored with a document (GDTax); zero for a document that is not stored yet.
+struct StoredTaxes {
+  Currency tax, taxBase, taxRef;
+};
+
+// Members in interface order.
+class DocFunc : public Object {
+ public:
+  // ---- Properties -------------------------------------------------------------------------------
+  Ref<XALSBEproxy> Doc() const { return st_.Doc.get(); }
+  void SetDoc(const Ref<XALSBEproxy>& value) { st_.Doc = value; }
+  Ref<xal::DataObject> DocData() const { return st_.DocData.get(); }
+  void SetDocData(const Ref<xal::DataObject>& value) { st_.DocData = value; }
+  Ref<xal::XALServer> XALServer() const { return st_.Server.get(); }
+  void SetXALServer(const Ref<xal::XALServer>& value) { st_.Server = value; }
+
+  // ---- Lifecycle --------------------------------------------------------------------------------
+  // Configures the object for the kind of document behind DocData. Needs Doc, DocData, XALServer.
+  void Create();
+  // Releases every reference; no handler may be called afterwards.
+  void Destroy();
+  bool Doc_TestScript();
+  bool Doc_Initialize();
+  bool Doc_Show();
+  bool Doc_Valid();
+  bool AddNewDocument();
+  bool WhenDocument();
+  bool VDocument();
+  bool DelRow();
+  // Binds RowOB and RowsOB to another row set.
+  void SetRowOB(Ref<xal::DataObject>& pRowOB);
+
+  // ---- Amounts, quantities and taxes ------------------------------------------------------------
+  bool DoHeaderRefresh();
+  bool AdjustAllAmounts();
+  bool RecomputeDocAmounts();
+  bool WAmount();
+  bool WCost();
+  bool WQuantity();
+  bool WTaxAmount();
+  bool WRowTaxAmount();
+  bool WRowTax();
+  bool WDealState();
+  bool WSeries();
+  bool WDRStoreRow();
+  bool VAmount();
+  bool VQuantity();
+  bool VCost();
+  bool VUnit();
+  bool VTax();
+  bool VTaxAmount();
+  bool VRowTax();
+  bool VRowTaxAmount();
+  bool VDocRow();
+  Variant DQuantity();
+  Variant DSeries();
+  Variant DRowDiscount();
+
+  // ---- For the host and tests (not in the type library) ----------------------------------------
+  const DocState& State() const { return st_; }
+
+ private:
+  // ---- The handler template (handler.h, handler.cpp) -------------------------------------------
+  enum class ResultRule {
+    AsLastSet,       // the result as the body last set it, also after an error
+    TrueAfterLeave,  // True once the leave step ran, whatever happened in the body
+  };
+  template <class T, class F>
+  T RunHandler(const char* name, T start, ResultRule rule, F&& body);
+  // A boolean handler: starts False; the body sets its result through the reference.
+  template <class F>
+  bool Handle(const char* name, F&& body);
+  // A boolean handler that returns True even when its body failed.
+  template <class F>
+  bool HandleAlwaysTrue(const char* name, F&& body);
+  // A default-value handler: starts Empty.
+  template <class F>
+  Variant HandleDefault(const char* name, F&& body);
+  void EnterHandler(const std::string& Name);
+  void LeaveHandler(const std::string& Name, const TrappedError& error);
+  void RunDeferredWork(const std::string& Name);
+  void ReportError(const std::string& Name, const TrappedError& error);
+  // Whether a header change is carried into the rows (see handler.cpp).
+  bool CarryToRows(const std::string& key, const std::string& question);
+
+  // ---- Options and small reads shared by all topics ---------------------------------------------
+  Variant UserOption(const std::string& section, const std::string& key, const Variant& defaultValue);
+  Variant SystemOption(const std::string& section, const std::string& key, const Variant& defaultValue);
+  // A read-only snapshot of an SQL query on its first row; never Nothing (error 91 instead).
+  Ref<xal::DataObject> OpenQuery(const std::string& sql);
+  Ref<ParamList> NewParams();
+  // A keyed host message ("Err_DocDateMissing") in the current language.
+  std::string HostText(const std::string& key);
+  void Status(const std::string& text);
+
+  // ---- Profile (profile.cpp) --------------------------------------------------------------------
+  void ApplyDefaults();
+  void ApplyProfile();
+  void ApplyClosingSteps();
+  void FillValueLists();
+  void FillRegisterLists();
+  void BindRowForm();
+
+  // ---- Lifecycle helpers (lifecycle.cpp) --------------------------------------------------------
+  void SetNewDocDefaults();
+  std::string OptionName();
+  bool IsEmptyRow();
+  bool HasDuplicate();
+  void UnlockDocument();
+  bool CompanyMessageBlocks();
+  bool CheckOnHand();
+  std::string CodeOf(const std::string& table, int32_t id);
+  void RunHeaderHandler(const char* name);
+
+  // ---- Amounts (amounts.cpp) --------------------------------------------------------------------
+  void ComputeDocTotals(bool Full);
+  bool RecomputeRows(bool Full);
+  bool RecomputeRow(Ref<xal::DataObject>& Row, bool Full);
+  void ResetDiscountChecks();
+  // The header totals WhenDocument builds: a full pass in the document currency, and the base and
+  // reference totals from the stored taxes. Must not run WhenDocument itself.
+  void InitialTotals(const StoredTaxes& taxes);
+  // The quantity `quantity` of unit `unit` in unit `baseUnit`, through the units' relations.
+  double UnitToBase(double quantity, int32_t unit, int32_t baseUnit);
+
+  DocState st_;
+};
+
+}  // namespace xal
