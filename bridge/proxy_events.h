@@ -8,10 +8,11 @@
 // lines an event log writes. One line per event, in the interface's order (ids 1 to 25, then 27,
 // 26, 28):
 //   X(dispid, name, (C++ parameters), (parameter names), log)
-// `log` says what a log line of the event shows, nullptr for an event no log records (the data
-// plumbing: caches, settings, selection). Its form mirrors the line: parameter names separated
-// by ",", "[Name]" for one left out when it is empty, and "->Name" for the answer shown after the
-// call, e.g. "Prompt,Buttons,[Title]->RetVal" gives `MsgBox("Save?",4)->7`.
+// `log` says what a log line of the event shows (nullptr: no line). Its form mirrors the line: an
+// optional "Name:" in front when the line is to carry the name the script called rather than the
+// event's (the cache, settings and selection requests), parameter names separated by ",",
+// "[Name]" for one left out when it is empty, and "->Name" for the answer shown after the call,
+// e.g. "Prompt,Buttons,[Title]->RetVal" gives `MsgBox("Save?",4)->7`.
 #pragma once
 
 #include <memory>
@@ -35,13 +36,13 @@
   X(8, DoInputBox, (const Ref<ParamList>& Params, int32_t Buttons, const std::string& Title, bool& RetVal),         \
     (Params, Buttons, Title, RetVal), "Title->RetVal")                                                              \
   X(9, DoCheckCache, (const std::string& sData, const std::string& sLink, bool& bExists),                          \
-    (sData, sLink, bExists), nullptr)                                                                               \
+    (sData, sLink, bExists), "CheckCachedRows:sData,sLink->bExists")                                                                               \
   X(10, DoGetCache, (const std::string& sData, const std::string& sLink, Ref<DataObject>& obCache),                \
-    (sData, sLink, obCache), nullptr)                                                                               \
-  X(11, DoReleaseCache, (const std::string& sData, const std::string& sLink), (sData, sLink), nullptr)              \
+    (sData, sLink, obCache), "CachedRows:sData,sLink->obCache")                                                                               \
+  X(11, DoReleaseCache, (const std::string& sData, const std::string& sLink), (sData, sLink), "FreeCachedRows:sData,sLink") \
   X(12, DoOnNewRow, (bool& RetVal), (RetVal), "")                                                                   \
   X(13, GetSettings, (const std::string& sKey, const Variant& vDefault, Variant& vRetVal),                          \
-    (sKey, vDefault, vRetVal), nullptr)                                                                             \
+    (sKey, vDefault, vRetVal), "Settings:sKey->vRetVal")                                                                             \
   X(14, DoAddMenuItem, (const std::string& sCaption, const std::string& sFuncName, std::string& sCmdString,         \
                         bool fForceEdit, int16_t iShift, int16_t iKeyCode, const std::string& sMode),               \
     (sCaption, sFuncName, sCmdString, fForceEdit, iShift, iKeyCode, sMode), "sCaption,sFuncName")                  \
@@ -51,7 +52,7 @@
   X(17, DoCmdExecute, (const std::string& Cmd, bool Posted, const Variant& Param), (Cmd, Posted, Param),            \
     "Cmd,[Param]")                                                                                                  \
   X(18, DoInvokeFunc, (const std::string& FuncName, Variant& RetVal), (FuncName, RetVal), "FuncName")              \
-  X(19, GetSelBookmarks, (ObjectRef& SelBookmarks), (SelBookmarks), nullptr)                                        \
+  X(19, GetSelBookmarks, (ObjectRef& SelBookmarks), (SelBookmarks), "SelBookmarks:")                                        \
   X(20, DoShowForm, (const Variant& FormID, const std::string& Filter, const std::string& Order, bool Linked,       \
                      const Ref<DataObject>& DataOB, const std::string& OpenMode),                                   \
     (FormID, Filter, Order, Linked, DataOB, OpenMode), "FormID,Filter")                                             \

@@ -27,8 +27,8 @@ bool IsBlank(const Variant& v) { return v.IsEmpty() || v.IsMissing() || (v.IsStr
 
 // A line is built in these steps:
 //   1. An event whose log is nullptr has no line.
-//   2. The name is the event's without a leading "Do"; a posted command reads "CmdPost", as the
-//      script wrote it.
+//   2. The name is the one the log names before a ":" (the proxy member the script called), else
+//      the event's without a leading "Do"; a posted command reads "CmdPost", as the script wrote it.
 //   3. The arguments are the parameters the log names, in its order, as ArgText writes them: text
 //      in quotes, numbers and Booleans as CStr writes them, an object as "<object>" or "Nothing".
 //      A "[Name]" parameter is left out when it is Empty, Missing or "".
@@ -43,9 +43,13 @@ std::string ProxyEventLine(const ProxyEventEntry& event, std::span<const Variant
     return kNone;
   };
   std::string_view name(event.name);
+  std::string_view log(event.log);
+  if (const size_t colon = log.find(':'); colon != std::string_view::npos) {
+    name = log.substr(0, colon);
+    log.remove_prefix(colon + 1);
+  }
   if (name == "DoCmdExecute" && CBool(arg("Posted"))) name = "CmdPost";
   if (name.starts_with("Do")) name.remove_prefix(2);
-  const std::string_view log(event.log);
   const size_t arrow = log.find("->");
   std::string line = std::string(name) + "(";
   bool first = true;

@@ -100,8 +100,8 @@ TEST_F(Sessions, ScriptedTranscript) {
             "GetObject(\"Nope\")->Nothing");
 }
 
-// Every event of the proxy through the session: the logged ones give these lines, the data plumbing
-// (caches, settings, selection) none.
+// Every event of the proxy through the session gives its line; the cache, settings and selection
+// requests carry the name the script called.
 TEST_F(Sessions, TranscriptLineOfEveryEvent) {
   auto s = DocumentSession::Open(conn, "SDInvoice", 1000);
   ObjectRef doc = s->Proxy();
@@ -132,11 +132,11 @@ TEST_F(Sessions, TranscriptLineOfEveryEvent) {
       {"Properties", {Variant("P")}, "Properties(\"P\")"},
       {"SendMail", {Variant(params)}, "SendMail()"},
       {"ExportReport", {Variant(3), Variant(), Variant("f.pdf")}, "ExportReport(3,\"f.pdf\")"},
-      {"CachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
-      {"CheckCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
-      {"FreeCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
-      {"Settings", {Variant("k")}, ""},
-      {"SelBookmarks", {}, ""},
+      {"CachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, "CachedRows(\"SDInvoiceRow\",\"Next\")"},
+      {"CheckCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, "CheckCachedRows(\"SDInvoiceRow\",\"Next\")->True"},
+      {"FreeCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, "FreeCachedRows(\"SDInvoiceRow\",\"Next\")"},
+      {"Settings", {Variant("k")}, "Settings(\"k\")->"},
+      {"SelBookmarks", {}, "SelBookmarks()"},
   };
   for (const auto& r : rows) {
     SCOPED_TRACE(r.member);
