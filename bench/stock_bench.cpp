@@ -3,6 +3,8 @@
 // without closed periods) and in the server kind (the current balance row).
 #include <benchmark/benchmark.h>
 
+#include <unistd.h>
+
 #include <filesystem>
 #include <string>
 
@@ -17,8 +19,8 @@ namespace {
 // over a year, and the flows before July closed into DBalanceStore.
 xal::Ref<xal::host::HostConnection> StockDb(int32_t kind, int64_t rows, bool closed) {
   const auto path = std::filesystem::temp_directory_path() /
-                    ("xal_stock_bench_" + std::to_string(kind) + "_" + std::to_string(rows) +
-                     (closed ? "_c" : "") + ".db");
+                    ("xal_stock_bench_" + std::to_string(::getpid()) + "_" + std::to_string(kind) + "_" +
+                     std::to_string(rows) + (closed ? "_c" : "") + ".db");
   std::filesystem::remove(path);
   auto conn = xal::host::HostConnection::Open(path.string(), kind);
   const double start = xal::DateSerial(2009, 1, 1).serial;

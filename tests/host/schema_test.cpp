@@ -4,7 +4,6 @@
 #include <gtest/gtest.h>
 
 #include "host/document_session.h"
-#include "host/schema.h"
 #include "host_fixture.h"
 #include "runtime/convert.h"
 
@@ -137,13 +136,6 @@ TEST_F(Schema, LinkedFieldsAndSubRowsTheHandlersRead) {
   EXPECT_EQ(c->db().Scalar("SELECT IDDRStore FROM DRStockReserve WHERE ID = 5"), Variant(101));
   EXPECT_EQ(c->db().Scalar("SELECT IDGRArticle FROM DRStockReserveRel WHERE IDDDStoreDRow = 70"), Variant(1));
   s->Close();
-}
-
-TEST(SchemaRows, LinkColumnsOfTheRowTables) {
-  EXPECT_EQ(DocumentLinkColumn("ddstoredrow"), "IDDoc");
-  EXPECT_EQ(DocumentLinkColumn("VDVoucherRow"), "IDVDVoucher");
-  EXPECT_EQ(DocumentLinkColumn("CADocRow"), "IDCADocument");
-  EXPECT_EQ(DocumentLinkColumn("NoSuchRow"), "IDDoc");
 }
 
 }  // namespace
