@@ -17,6 +17,7 @@
 #include "runtime/dispatch.h"
 #include "runtime/events.h"
 #include "runtime/trap.h"
+#include "server/internal/transaction.h"
 
 namespace xal::testing {
 namespace {
@@ -463,6 +464,61 @@ TEST(HostileHost, EveryMemberReturnsItsStartValueOrRaisesTheDocumentedError) {
   for (const auto& [key, row] : byKey) EXPECT_TRUE(used.count(key)) << key << ": the row names no member";
   RecordProperty("cases", cases);
   std::printf("[ hostile  ] %d member x fault cases\n", cases);
+}
+
+// ---------------------------------------------------------------------------------------------
+// The transaction helper the merge and the period closing share
+// ---------------------------------------------------------------------------------------------
+
+// A connection that records the transaction calls; it may offer no transactions, or fail its
+// rollback.
+class TransactionLog : public HostileConn {
+ public:
+  TransactionLog(bool offers, bool rollbackFails)
+      : HostileConn(Hostility{Fault::kEmpty, kDbFile}), offers_(offers), rollbackFails_(rollbackFails) {}
+  std::string log;
+  bool BeginTransaction() override { return log += "Begin", offers_; }
+  void CommitTransaction() override { log += " Commit"; }
+  void RollbackTransaction() override {
+    log += " Rollback";
+    if (rollbackFails_) Raise(kHostError);
+  }
+
+ private:
+  bool offers_, rollbackFails_;
+};
+
+TEST(InTransaction, CommitsKeptWorkRollsBackTheRestAndKeepsTheFirstError) {
+  struct Row {
+    bool offers;
+    int body;  // 1: keep, 0: discard, else the error it raises
+    bool rollbackFails;
+    const char* log;
+    const char* outcome;
+  } rows[] = {
+      {true, 1, false, "Begin Commit", "returns Boolean True"},
+      {true, 0, false, "Begin Rollback", "returns Boolean False"},
+      {true, 5, false, "Begin Rollback", "raises 5"},
+      {true, 5, true, "Begin Rollback", "raises 5"},  // the failed rollback does not hide the cause
+      {false, 1, false, "Begin", "returns Boolean True"},  // no transactions: statements one by one
+      {false, 0, false, "Begin", "returns Boolean False"},
+      {false, 5, false, "Begin", "raises 5"},
+  };
+  for (const auto& r : rows) {
+    SCOPED_TRACE(std::string(r.log) + " / " + r.outcome);
+    TransactionLog conn(r.offers, r.rollbackFails);
+    std::string outcome;
+    try {
+      outcome = Returns(Variant(server::internal::InTransaction(conn, [&] {
+        if (r.body > 1) Raise(r.body);
+        return r.body == 1;
+      })));
+    } catch (const VbError& e) {
+      outcome = Raises(e.number());
+    }
+    EXPECT_EQ(conn.log, r.log);
+    EXPECT_EQ(outcome, r.outcome);
+  }
 }
 
 }  // namespace
