@@ -59,6 +59,13 @@ enum QueryMode : int32_t {
 // string table's columns: kLangEnglish 3, kLangEstonian 4, kLangThird 5; any other reads English.
 using LanguageID = UILanguage;
 
+// DataObject::RecordOperation codes.
+constexpr int32_t kRecordOpMoveReferences = 41;  // every reference to the current record moves to the target
+// XALServer::Text kinds.
+constexpr int32_t kTextMessage = 2;  // a message by key (the other kinds are table captions)
+// XALConnect::LogCheck flags.
+constexpr int32_t kLogRecordChanges = 16;  // merges and deletions of register records
+
 // XALConnect::CheckRight: the user right asked for with kind "DOCUMENT".
 constexpr int32_t kRightNone = 0;      // argument a: no sub-right
 constexpr int32_t kRightExecute = 4;   // argument b: may run the document's special functions
@@ -89,10 +96,10 @@ class DataObject : public Object {
   // The owning record; on a header, the values as they were saved.
   virtual Ref<DataObject> Owner() = 0;
   virtual std::string TableName() = 0;
-  virtual Variant Property(int32_t number) = 0;  // 14: the table name
+  virtual Variant Property(int32_t number) = 0;  // kPropTableName, kPropLastError
   // A named function of the host ("ActualRowCount", "GetBalance", …) with a ParamList or object.
   virtual Variant CallFunction(const std::string& name, const Variant& params, int32_t flags) = 0;
-  // A record-level operation by code (41: move the references of the current record to another).
+  // A record-level operation by code (kRecordOpMoveReferences).
   virtual Variant RecordOperation(int32_t code, const Variant& arg) = 0;
   virtual Ref<XALConnect> Connection() = 0;
 };
@@ -100,7 +107,7 @@ class DataObject : public Object {
 class XALConnect : public Object {
  public:
   virtual Ref<XALServer> Server() = 0;
-  // 2: the SQL server dialect; any other value: the file database.
+  // A DatabaseKind: kDbServer speaks the SQL server dialect, any other value the file database.
   virtual int32_t DatabaseKind() = 0;
   virtual int32_t UserID() = 0;
   virtual Ref<DataObject> UserObject() = 0;
@@ -118,7 +125,7 @@ class XALConnect : public Object {
                           int32_t b) = 0;
   virtual bool LogCheck(const std::string& kind, const std::string& table, int32_t flags) = 0;
   virtual void WriteLog(const std::string& kind, const std::string& table, int32_t id, const std::string& text) = 0;
-  virtual Variant Property(int32_t number) = 0;  // 8: the language identifier
+  virtual Variant Property(int32_t number) = 0;  // kConnPropLanguage
 
   // Optional transactions: a host that offers none returns False from BeginTransaction, and the
   // component then runs its statements one by one.
@@ -136,9 +143,9 @@ class XALServer : public Object {
   virtual Ref<DataObject> OpenDataObject(const std::string& table) = 0;
   virtual Ref<ParamList> NewParamList() = 0;
   virtual Ref<XALConnect> Connection() = 0;
-  // A message or table caption by key, in language `lang` (kind 2: a message).
+  // A message or table caption by key, in language `lang` (kind kTextMessage: a message).
   virtual std::string Text(const std::string& key, int32_t kind, int32_t lang) = 0;
-  virtual Variant Property(int32_t number) = 0;  // 5: the language identifier
+  virtual Variant Property(int32_t number) = 0;  // kServerPropLanguage, kServerPropRowRights(Alt)
   // One ParamList per table, keyed by table name, with "isDocument", "isRegister", "isReport",
   // "CanAdminister" and "SystemTable".
   virtual Ref<ParamList> TableCatalogue() = 0;
@@ -167,7 +174,7 @@ class IXALCallback : public Object {
   virtual Variant CallBack(int32_t callerID, const std::string& sCommand, const std::string& sMessage,
                            const Variant& vParam) = 0;
   virtual bool Notify(int32_t callerID, int32_t eNotify, const std::string& sMessage, const Variant& vParam) = 0;
-  // The answer code: 6 Yes, 7 No, 1 OK, 2 Cancel.
+  // The answer code: kAnswerYes, kAnswerNo, kAnswerOK, kAnswerCancel.
   virtual int32_t MsgBox(int32_t callerID, const std::string& Prompt, int32_t Buttons, const std::string& Title,
                          const std::string& Helpfile, int32_t Context) = 0;
   virtual bool InputBox(int32_t callerID, Ref<ParamList>& Params, int32_t Buttons, const std::string& Title) = 0;
@@ -180,9 +187,15 @@ constexpr int32_t kMbButtonsMask = 7;      // the buttons part of a Buttons valu
 constexpr int32_t kMbDefaultSecond = 256;  // the second button is preselected
 constexpr int32_t kMbYesNoDefaultNo = kMbYesNo + kMbDefaultSecond;
 constexpr int32_t kMbInformation = 64;
+constexpr int32_t kMbQuestion = 32;     // icons, added to the buttons
+constexpr int32_t kMbExclamation = 48;
 constexpr int32_t kAnswerOK = 1;
 constexpr int32_t kAnswerCancel = 2;
 constexpr int32_t kAnswerYes = 6;
 constexpr int32_t kAnswerNo = 7;
+
+// IXALCallback::Notify kinds the component sends while it works (the host shows progress).
+constexpr int32_t kNotifyProgressStart = 2;  // value: the number of steps that follow
+constexpr int32_t kNotifyProgressStep = 4;
 
 }  // namespace xal

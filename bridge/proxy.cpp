@@ -3,19 +3,12 @@
 
 #include "runtime/convert.h"
 #include "runtime/dispatch.h"
+#include "runtime/trap.h"
+
+// The registries and the proxy's own bookkeeping ignore every error (TryStep), as a script expects
+// of them; that includes whatever the host's GetObject handler raises.
 
 namespace xal {
-
-namespace {
-// The registries and the proxy's own bookkeeping ignore every error, as a script expects of them.
-template <class F>
-void IgnoringErrors(F&& f) {
-  try {
-    f();
-  } catch (const VbError&) {
-  }
-}
-}  // namespace
 
 XALSBEproxy::XALSBEproxy()
     : dataObjects_(std::make_unique<KeyedCollection<Ref<xal::DataObject>>>()),
@@ -40,7 +33,7 @@ Variant XALSBEproxy::ItemArray() const { return cell_ ? GetProperty(cell_, "Item
 
 Ref<xal::DataObject> XALSBEproxy::DataObject(const std::string& Name) {
   Ref<xal::DataObject> result;
-  IgnoringErrors([&] {
+  TryStep([&] {
     if (dataObjects_)
       if (auto* found = dataObjects_->Find(Name)) {
         result = *found;
@@ -57,7 +50,7 @@ Ref<xal::DataObject> XALSBEproxy::DataObject(const std::string& Name) {
 }
 
 void XALSBEproxy::AddDataOB(const std::string& Name, Ref<xal::DataObject>& OB) {
-  IgnoringErrors([&] {
+  TryStep([&] {
     if (!dataObjects_) return;
     dataObjects_->RemoveKey(Name);
     dataObjects_->Add(OB, Name);
@@ -71,7 +64,7 @@ ObjectRef XALSBEproxy::UIObject(const std::string& Name) const {
 }
 
 void XALSBEproxy::AddUIOB(const std::string& Name, const Ref<IXALUIObject>& OB) {
-  IgnoringErrors([&] {
+  TryStep([&] {
     if (!uiObjects_) return;
     uiObjects_->RemoveKey(Name);
     uiObjects_->Add(OB, Name);
@@ -85,7 +78,7 @@ Variant XALSBEproxy::Values(const std::string& Key) const {
 }
 
 void XALSBEproxy::SetValues(const std::string& Key, const Variant& value) {
-  IgnoringErrors([&] {
+  TryStep([&] {
     if (!values_) return;
     values_->items().RemoveKey(Key);
     values_->items().Add(value, Key);
@@ -95,7 +88,7 @@ void XALSBEproxy::SetValues(const std::string& Key, const Variant& value) {
 Ref<ValueTexts> XALSBEproxy::ValueLists(const std::string& FieldName) {
   Ref<ValueTexts> result;
   if (FieldName.empty()) return result;
-  IgnoringErrors([&] {
+  TryStep([&] {
     Ref<Collection> lists = CValuelists();
     if (const Variant* found = lists->items().Find(FieldName)) {
       result = std::dynamic_pointer_cast<ValueTexts>(found->AsObject());
@@ -143,11 +136,7 @@ bool XALSBEproxy::ReloadLayout(const Variant& Layout, const std::string& Name) {
   // The answer stands for the method's own result: False until the host sets it.
   Variant answer(false);
   events_.Raise(&XALSBEproxyEvents::DoReloadLayout, Layout, Name, answer);
-  try {
-    return CBool(answer);
-  } catch (const VbError&) {
-    return false;
-  }
+  return TryOr([&] { return CBool(answer); }, false);
 }
 
 bool XALSBEproxy::ReloadSheet(int32_t NewID) {

@@ -203,7 +203,7 @@ void HostConnection::WriteLog(const std::string& kind, const std::string& table,
 }
 
 Variant HostConnection::Property(int32_t number) {
-  if (number == 8) return Variant(langID_);
+  if (number == kConnPropLanguage) return Variant(langID_);
   return Variant();
 }
 
@@ -355,14 +355,14 @@ std::string HostServer::Text(const std::string& key, int32_t kind, int32_t lang)
   ResultSet rs = conn()->db().Query("SELECT English, Estonian FROM XALMessage WHERE MsgKey = ? AND Kind = ?",
                                     {Variant(key), Variant(kind)});
   if (rs.rows.empty()) return key;
-  const Variant& text = rs.rows[0][lang == 4 ? 1 : 0];
+  const Variant& text = rs.rows[0][lang == kLangEstonian ? 1 : 0];
   return text.IsString() && !text.AsString().empty() ? text.AsString() : rs.rows[0][0].AsString();
 }
 
 Variant HostServer::Property(int32_t number) {
   auto it = properties_.find(number);
   if (it != properties_.end()) return it->second;
-  if (number == 5) return Variant(conn()->Language());
+  if (number == kServerPropLanguage) return Variant(conn()->Language());
   return Variant(false);
 }
 

@@ -83,7 +83,7 @@ class HostConnection : public XALConnect {
   std::shared_ptr<Database> db_;
   int32_t kind_;
   int32_t userID_;
-  int32_t langID_ = 3;
+  int32_t langID_ = kLangEnglish;
   int64_t session_;
   int transactionDepth_ = 0;
   std::string lastError_;

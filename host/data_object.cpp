@@ -303,7 +303,7 @@ void HostDataObject::Save() {
 
 Variant HostDataObject::Property(int32_t number) {
   if (number == kPropTableName) return Variant(table_);
-  if (number == 37) return Variant(conn_->LastError());
+  if (number == kPropLastError) return Variant(conn_->LastError());
   return Variant();
 }
 

@@ -89,7 +89,7 @@ class ConditionParser {
 
   // The table under its alias with every join the condition needed.
   std::string From() const {
-    const bool bracket = conn_.DatabaseKind() != 2;
+    const bool bracket = !IsServerDialect(conn_.DatabaseKind());
     std::string from = self_.TableName() + " " + alias_;
     for (size_t k = 0; k < joins_.size(); ++k) {
       const bool wrap = bracket && k + 1 < joins_.size();

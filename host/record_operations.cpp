@@ -67,7 +67,8 @@ std::vector<std::pair<std::string, std::string>> ReferencesTo(Database& db, cons
 }  // namespace
 
 Variant HostDataObject::RecordOperation(int32_t code, const Variant& arg) {
-  if (code != 41) Raise(kErrInvalidCall, "Record operation " + std::to_string(code) + " is not supported");
+  if (code != kRecordOpMoveReferences)
+    Raise(kErrInvalidCall, "Record operation " + std::to_string(code) + " is not supported");
   const Variant source = Field("ID");
   const int32_t target = CLng(arg);
   if (source.IsNull() || target == 0) Raise(kErrInvalidCall, "Record operation 41 needs a current record and a target");

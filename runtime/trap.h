@@ -62,7 +62,7 @@ auto TryOr(F&& step, T fallback) noexcept -> std::decay_t<decltype(step())> {
   try {
     return std::forward<F>(step)();
   } catch (...) {
-    return std::move(fallback);
+    return fallback;  // moved implicitly, converted to the step's type when it differs
   }
 }
 
@@ -98,6 +98,10 @@ class Checked {
  public:
   Checked() = default;
   Checked(Ref<T> p) : p_(std::move(p)) {}  // NOLINT: implicit on purpose, it wraps any Ref
+  // A host answer typed as a derived class (a HostConnection for an XALConnect) wraps as well.
+  template <class U>
+    requires(std::is_convertible_v<U*, T*> && !std::is_same_v<U, T>)
+  Checked(Ref<U> p) : p_(std::move(p)) {}  // NOLINT: implicit on purpose
   T* operator->() const { return &Require(p_); }
   T& operator*() const { return Require(p_); }
   const Ref<T>& get() const { return p_; }

@@ -8,13 +8,13 @@
 
 #include <chrono>
 #include <cmath>
-#include <exception>
 #include <random>
 #include <string>
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
+#include "server/internal/transaction.h"
 #include "server/internal/work_table.h"
 #include "server/table_filters.h"
 
@@ -32,12 +32,6 @@ void SetWorkTableNumberSource(WorkTableNumberSource source) { tWorkTableNumbers 
 
 namespace {
 
-using internal::Require;
-
-constexpr int32_t kRecordOpMoveReferences = 41;
-constexpr int32_t kPropLastError = 37;
-constexpr int32_t kTextMessage = 2;
-constexpr int32_t kLogRegisterChanges = 16;
 // How many work-table names a merge tries before it gives up.
 constexpr int kWorkTableTries = 20;
 
@@ -57,9 +51,9 @@ int32_t NextWorkTableNumber() {
 }
 
 struct Merge {
-  Ref<DataObject> obj;
-  Ref<XALConnect> conn;
-  Ref<XALServer> server;
+  Checked<DataObject> obj;
+  Checked<XALConnect> conn;
+  Checked<XALServer> server;
   int32_t lang = 0;
   std::string table;  // the register both records belong to
   int32_t source = 0, target = 0;
@@ -74,17 +68,19 @@ struct Merge {
 };
 
 // A field that may be absent from the table (not every register has a Code); empty then.
-std::string OptionalText(const Ref<DataObject>& obj, const char* field) {
-  try {
-    const Variant v = obj->Field(field);
-    return (v.IsEmpty() || v.IsNull()) ? std::string() : CStr(v);
-  } catch (const std::exception&) {
-    return std::string();
-  }
+std::string OptionalText(const Checked<DataObject>& obj, const char* field) {
+  return TryOr(
+      [&] {
+        const Variant v = obj->Field(field);
+        return (v.IsEmpty() || v.IsNull()) ? std::string() : CStr(v);
+      },
+      std::string());
 }
 
-bool SameValue(const Ref<DataObject>& a, const Ref<DataObject>& b, const char* field) {
-  return CStr(a->Field(field)) == CStr(b->Field(field));
+// Units, quantity types and category groups are codes, and codes compare without regard to case
+// (as CheckCategory's query compares the groups): "COLOR" and "color" are one group.
+bool SameValue(const Checked<DataObject>& a, const Checked<DataObject>& b, const char* field) {
+  return TextEquals(CStr(a->Field(field)), CStr(b->Field(field)));
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -114,18 +110,20 @@ void MergeMoneyBalances(const Merge& m, const std::string& balance) {
 // merge running in another session right now, so an existing table is never dropped: the merge
 // draws another name and tries again.
 std::string CollectStockFlows(const Merge& m, const std::string& key, const std::string& other) {
-  for (int attempt = 1;; ++attempt) {
+  auto collectInto = [&](const std::string& work) {
+    m.Exec("SELECT DocDate, " + other + ", Sum(DebitQFlow) AS DQ, Sum(CreditQFlow) AS CQ, " +
+           "Sum(DebitFlowBase) AS DFB, Sum(CreditFlowBase) AS CFB, Sum(DebitFlowRef) AS DFR, Sum(CreditFlowRef) AS CFR " +
+           "INTO " + work + " FROM DBalanceStore " + "WHERE " + key + " = " + Num(m.source) + " GROUP BY DocDate, " +
+           other);
+  };
+  for (int attempt = 1; attempt < kWorkTableTries; ++attempt) {
     const std::string work = Num(NextWorkTableNumber()) + "TmpDBalanceStore";
-    try {
-      m.Exec("SELECT DocDate, " + other + ", Sum(DebitQFlow) AS DQ, Sum(CreditQFlow) AS CQ, " +
-             "Sum(DebitFlowBase) AS DFB, Sum(CreditFlowBase) AS CFB, Sum(DebitFlowRef) AS DFR, Sum(CreditFlowRef) AS CFR " +
-             "INTO " + work + " FROM DBalanceStore " + "WHERE " + key + " = " + Num(m.source) + " GROUP BY DocDate, " +
-             other);
-      return work;
-    } catch (const std::exception&) {
-      if (attempt == kWorkTableTries) throw;
-    }
+    if (TryStep([&] { collectInto(work); })) return work;
   }
+  // The last name drawn: its failure is the merge's.
+  const std::string work = Num(NextWorkTableNumber()) + "TmpDBalanceStore";
+  collectInto(work);
+  return work;
 }
 
 // Articles and stores: the source's flows of a date and store (or article) are added to the
@@ -136,23 +134,24 @@ void MergeStockBalances(const Merge& m) {
   const std::string other = article ? "IDDRStore" : "IDGRArticle";
   const std::string s = Num(m.source), d = Num(m.target);
   const std::string work = CollectStockFlows(m, key, other);
-  try {
-    m.Exec("UPDATE DBalanceStore A INNER JOIN " + work + " B ON A." + other + " = B." + other + " " +
-           "SET A.DebitQFlow = A.DebitQFlow + B.DQ, A.CreditQFlow = A.CreditQFlow + B.CQ, " +
-           "A.DebitFlowBase = A.DebitFlowBase + B.DFB, A.CreditFlowBase = A.CreditFlowBase + B.CFB, " +
-           "A.DebitFlowRef = A.DebitFlowRef + B.DFR, A.CreditFlowRef = A.CreditFlowRef + B.CFR " +
-           "WHERE A.DocDate = B.DocDate AND A." + key + " = " + d);
-    m.Exec("UPDATE DBalanceStore A SET A." + key + " = " + d + " WHERE A." + key + " = " + s +
-           " AND Not Exists (SELECT * FROM DBalanceStore X WHERE A.DocDate = X.DocDate " + "AND X." + other +
-           " = A." + other + " AND X." + key + " = " + d + ")");
-    m.Exec("DELETE * FROM DBalanceStore WHERE " + key + " = " + s);
-  } catch (const std::exception&) {
+  TrappedError failure;
+  const bool moved = TryReport(
+      [&] {
+        m.Exec("UPDATE DBalanceStore A INNER JOIN " + work + " B ON A." + other + " = B." + other + " " +
+               "SET A.DebitQFlow = A.DebitQFlow + B.DQ, A.CreditQFlow = A.CreditQFlow + B.CQ, " +
+               "A.DebitFlowBase = A.DebitFlowBase + B.DFB, A.CreditFlowBase = A.CreditFlowBase + B.CFB, " +
+               "A.DebitFlowRef = A.DebitFlowRef + B.DFR, A.CreditFlowRef = A.CreditFlowRef + B.CFR " +
+               "WHERE A.DocDate = B.DocDate AND A." + key + " = " + d);
+        m.Exec("UPDATE DBalanceStore A SET A." + key + " = " + d + " WHERE A." + key + " = " + s +
+               " AND Not Exists (SELECT * FROM DBalanceStore X WHERE A.DocDate = X.DocDate " + "AND X." + other +
+               " = A." + other + " AND X." + key + " = " + d + ")");
+        m.Exec("DELETE * FROM DBalanceStore WHERE " + key + " = " + s);
+      },
+      [&](const TrappedError& e) { failure = e; });
+  if (!moved) {
     // Without a host transaction the work table would outlive the failure.
-    try {
-      m.Exec("DROP TABLE " + work);
-    } catch (const std::exception&) {
-    }
-    throw;
+    TryStep([&] { m.Exec("DROP TABLE " + work); });
+    Raise(failure.number, failure.description);
   }
   m.Exec("DROP TABLE " + work);
   m.Exec("DELETE * FROM DCurBalanceStore WHERE " + key + " = " + s);
@@ -161,14 +160,15 @@ void MergeStockBalances(const Merge& m) {
 // After the move: the target's current balances and costs are rebuilt by the host.
 void RefreshCurrentBalances(const Merge& m) {
   const bool article = TextEquals(m.table, "GRArticle");
-  Ref<ParamList> args = m.server->NewParamList();
+  const Checked<ParamList> args = m.server->NewParamList();
   args->Set("FieldName", Variant("ID" + m.table));
   args->Set("FieldValue", Variant(m.target));
-  m.conn->ServerCommand("Update_DCurBalance", args);
-  Ref<ParamList> costArgs = m.server->NewParamList();
+  m.conn->ServerCommand("Update_DCurBalance", args.get());
+  const Checked<ParamList> costArgs = m.server->NewParamList();
   costArgs->Set("Filter", Variant(std::string(article ? "" : "1")));
   costArgs->Set("ID", Variant(m.target));
-  Require(m.server->OpenDataObject("GRArticle")).CallFunction("CountCost", Variant(costArgs), 0);
+  const Checked<DataObject> articles = m.server->OpenDataObject("GRArticle");
+  articles->CallFunction("CountCost", Variant(costArgs.get()), 0);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -179,8 +179,8 @@ void RefreshCurrentBalances(const Merge& m) {
 std::string RunMerge(const Merge& m) {
   const std::string s = Num(m.source), d = Num(m.target);
   if (m.obj->FindFirst("ID = " + s, 0) != 0) return m.Fail("Err_TargetNotFound");
-  Ref<DataObject> target = m.server->OpenQuery(m.table, 1, "ID = " + d, "");
-  if (Require(target).IsEOF()) return m.Fail("Err_TargetNotFound");
+  const Checked<DataObject> target = m.server->OpenQuery(m.table, kQueryEditable, "ID = " + d, "");
+  if (target->IsEOF()) return m.Fail("Err_TargetNotFound");
 
   const bool isArticle = TextEquals(m.table, "GRArticle");
   const bool isStore = TextEquals(m.table, "DRStore");
@@ -209,9 +209,9 @@ std::string RunMerge(const Merge& m) {
   const std::string errorAfter = CStr(m.obj->Property(kPropLastError));
   if (!errorAfter.empty() && errorAfter != errorBefore) return errorAfter;
 
-  if (!ResetOptions(m.conn, m.table, m.source, m.target)) return m.general;
+  if (!ResetOptions(m.conn.get(), m.table, m.source, m.target)) return m.general;
   if (m.deleteSource) m.Exec("DELETE FROM " + m.table + " WHERE ID=" + s);
-  if (m.conn->LogCheck("REGISTER", m.table, kLogRegisterChanges))
+  if (m.conn->LogCheck("REGISTER", m.table, kLogRecordChanges))
     m.conn->WriteLog("REGISTER", m.table, m.source, sourceCode + " Aggregated/Deleted (into: " + targetCode + ")");
   if (isArticle || isStore) RefreshCurrentBalances(m);
   return std::string();
@@ -228,45 +228,28 @@ bool AggrRec(const Ref<DataObject>& pObj, int32_t pObjID, const Ref<ParamList>& 
   Merge m;
   m.general = "Err_AggrRec";
   std::string errText = m.general;
-  bool transaction = false;
-  try {
+  const bool finished = TryStep([&] {
     if (pObj) {
       m.obj = pObj;
-      m.conn = pObj->Connection();
-      m.server = Require(m.conn).Server();
-      Require(m.server);
-      m.lang = CLng(m.conn->Property(8));
+      m.conn = m.obj->Connection();
+      m.server = m.conn->Server();
+      m.lang = CLng(m.conn->Property(kConnPropLanguage));
       m.general = errText = m.Text("Err_AggrRec");
-      m.table = Trim(CStr(pObj->Property(kPropTableName)));
+      m.table = Trim(CStr(m.obj->Property(kPropTableName)));
     }
     m.source = pObjID;
     m.target = pParams ? CLng(pParams->Item("TargetID")) : 0;
     m.deleteSource = pParams && IsTrue(pParams->Item("Delete"));
-    if (pObj && m.source != 0 && m.target != 0 && m.source != m.target) {
-      transaction = m.conn->BeginTransaction();
+    if (!pObj || m.source == 0 || m.target == 0 || m.source == m.target) return;
+    // One transaction when the host offers it: a merge that fails changes nothing.
+    internal::InTransaction(*m.conn, [&] {
       errText = RunMerge(m);
-      if (transaction) {
-        if (errText.empty())
-          m.conn->CommitTransaction();
-        else
-          m.conn->RollbackTransaction();
-        transaction = false;
-      }
-    }
-  } catch (const std::exception&) {
-    if (transaction) {
-      try {
-        m.conn->RollbackTransaction();
-      } catch (const std::exception&) {
-      }
-    }
-    errText = m.general;
-  }
+      return errText.empty();
+    });
+  });
+  if (!finished) errText = m.general;
   if (errText.empty()) return true;
-  try {
-    if (pParams) pParams->Set("ErrText", Variant(errText));
-  } catch (const std::exception&) {
-  }
+  if (pParams) TryStep([&] { pParams->Set("ErrText", Variant(errText)); });
   return false;
 }
 

@@ -11,14 +11,12 @@
 #include "runtime/convert.h"
 #include "runtime/dates.h"
 #include "runtime/error.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
 
 namespace {
-
-using internal::Require;
 
 // The calendar day of a date: the serial without its time of day (toward zero, as dates split).
 double WholeDays(Date d) { return std::trunc(d.serial); }
@@ -29,12 +27,12 @@ bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); 
 // Asks the data object of `view` for the balance of the record `id` named by `keyField` on `date`;
 // 0 when the host answers that it has none.
 Currency ViewBalance(const Ref<XALConnect>& conn, const char* view, const char* keyField, int32_t id, Date date) {
-  Ref<XALServer> server = Require(conn).Server();
-  Ref<DataObject> ob = Require(server).OpenDataObject(view);
-  Ref<ParamList> params = server->NewParamList();
+  const Checked<XALServer> server = Checked<XALConnect>(conn)->Server();
+  const Checked<DataObject> ob = server->OpenDataObject(view);
+  const Checked<ParamList> params = server->NewParamList();
   params->Set("Date", Variant(date));
   params->Set(keyField, Variant(id));
-  if (!IsTrue(Require(ob).CallFunction("GetBalance", Variant(params), 0))) return Currency();
+  if (!IsTrue(ob->CallFunction("GetBalance", Variant(params.get()), 0))) return Currency();
   return CCur(ob->Field("Balance"));
 }
 
@@ -51,17 +49,16 @@ Currency CountCashBalance(const Ref<XALConnect>& pXALConnect, int32_t pIDVRCashD
 // The engine hands an aggregate of a date column back as a plain number, so a found maximum is
 // turned into a Date here; Null (no earlier row) stays Null.
 Variant GetBalanceDate(const Ref<XALConnect>& pXALConnect, Date pDocDate, const std::string& pBalanceName) {
-  try {
-    Ref<DataObject> rs = Require(Require(pXALConnect).Server())
-                             .OpenQuery("SELECT MAX(DocDate) AS DDate FROM " + pBalanceName +
-                                            " WHERE DocDate<" + SQLDate(Variant(pDocDate)),
-                                        1, "", "");
-    const Variant v = Require(rs).Field("DDate");
-    if (v.IsNull() || v.IsEmpty()) return v;
-    return Variant(CDate(v));
-  } catch (const VbError&) {
-    return Variant();
-  }
+  return TryOr(
+      [&] {
+        const Checked<XALServer> server = Checked<XALConnect>(pXALConnect)->Server();
+        const Checked<DataObject> rs = server->OpenQuery(
+            "SELECT MAX(DocDate) AS DDate FROM " + pBalanceName + " WHERE DocDate<" + SQLDate(Variant(pDocDate)),
+            kQueryEditable, "", "");
+        const Variant v = rs->Field("DDate");
+        return (v.IsNull() || v.IsEmpty()) ? v : Variant(CDate(v));
+      },
+      Variant());
 }
 
 // Simple interest per day late: amount × percent / 100 for each whole day by which the payment
@@ -69,44 +66,46 @@ Variant GetBalanceDate(const Ref<XALConnect>& pXALConnect, Date pDocDate, const 
 // penalty is computed from it (0), as the system has always done.
 double ComputePenalty(double pAmount, Date pPDate, Date pPromptDate, double pPenaltyPercent, int32_t pIDGDPrompDate,
                       const Ref<XALConnect>& pXALConnect) {
-  try {
-    if (pAmount == 0 || pPDate.serial == 0) return 0;
-    if (!pXALConnect || pIDGDPrompDate == 0) {
-      const double days = WholeDays(pPDate) - WholeDays(pPromptDate);
-      if (WholeDays(pPromptDate) != 0 && pPenaltyPercent != 0 && pPDate > pPromptDate && days > 0)
-        return pAmount * pPenaltyPercent / 100 * days;
-      return 0;
-    }
-    Require(pXALConnect->Server())
-        .OpenQuery("SELECT * FROM GRTermPayment WHERE ID=" + std::to_string(pIDGDPrompDate), 1, "", "");
-    return 0;
-  } catch (const VbError&) {
-    return 0;
-  }
+  return TryOr(
+      [&]() -> double {
+        if (pAmount == 0 || pPDate.serial == 0) return 0;
+        if (!pXALConnect || pIDGDPrompDate == 0) {
+          const double days = WholeDays(pPDate) - WholeDays(pPromptDate);
+          if (WholeDays(pPromptDate) != 0 && pPenaltyPercent != 0 && pPDate > pPromptDate && days > 0)
+            return pAmount * pPenaltyPercent / 100 * days;
+          return 0;
+        }
+        Checked<XALServer>(pXALConnect->Server())
+            ->OpenQuery("SELECT * FROM GRTermPayment WHERE ID=" + std::to_string(pIDGDPrompDate), kQueryEditable, "",
+                        "");
+        return 0;
+      },
+      0.0);
 }
 
 // Monday to Friday from the first day to the last, both included: whole weeks count five days
 // each, the remaining days are looked at one by one. A last day before the first gives 0 or less
 // (the week count is rounded down, as Int does).
 int32_t ComputeWDays(Date pDate1, Date pDate2) {
-  try {
-    const double first = WholeDays(pDate1), last = WholeDays(pDate2);
-    const double weeks = std::floor((last - first) / 7);
-    double count = 5 * weeks;
-    for (double d = first + 7 * weeks; d <= last; d += 1)
-      if (Weekday(Date(d), 2) < 6) count += 1;
-    return CLng(Variant(count));
-  } catch (const VbError&) {
-    return 0;
-  }
+  return TryOr(
+      [&] {
+        const double first = WholeDays(pDate1), last = WholeDays(pDate2);
+        const double weeks = std::floor((last - first) / 7);
+        double count = 5 * weeks;
+        for (double d = first + 7 * weeks; d <= last; d += 1)
+          if (Weekday(Date(d), 2) < 6) count += 1;
+        return CLng(Variant(count));
+      },
+      int32_t{0});
 }
 
 int32_t GetEmployeeID(const Ref<XALConnect>& pXALConnect) {
-  XALConnect& conn = Require(pXALConnect);
-  const int32_t user = conn.UserID();
-  Ref<DataObject> rs = Require(conn.Server())
-                           .OpenQuery("SELECT IDEREmployee FROM XALUser WHERE ID=" + std::to_string(user), 1, "", "");
-  if (Require(rs).IsEOF()) return 0;
+  const Checked<XALConnect> conn = pXALConnect;
+  const int32_t user = conn->UserID();
+  const Checked<XALServer> server = conn->Server();
+  const Checked<DataObject> rs =
+      server->OpenQuery("SELECT IDEREmployee FROM XALUser WHERE ID=" + std::to_string(user), kQueryEditable, "", "");
+  if (rs->IsEOF()) return 0;
   return CLng(rs->Field("IDEREmployee"));
 }
 

@@ -35,6 +35,7 @@
 #include "runtime/convert.h"
 #include "runtime/dates.h"
 #include "runtime/text.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -162,11 +163,11 @@ class Replay {
   int charged_ = 0;
 };
 
-AccountingYear YearOf(const Ref<XALServer>& server, Date date) {
-  Ref<DataObject> years = server->OpenQuery("SELECT BeginDate, EndDate FROM BRAccountingYear WHERE BeginDate <= " +
+AccountingYear YearOf(const Checked<XALServer>& server, Date date) {
+  const Checked<DataObject> years = server->OpenQuery("SELECT BeginDate, EndDate FROM BRAccountingYear WHERE BeginDate <= " +
                                                 SQLDate(Variant(date)) + " AND EndDate >= " + SQLDate(Variant(date)) +
                                                 " ORDER BY BeginDate DESC",
-                                            1, "", "");
+                                            kQueryEditable, "", "");
   if (!years->IsEOF())
     return {WholeDays(CDate(years->Field("BeginDate"))), WholeDays(CDate(years->Field("EndDate")))};
   const int y = Year(date);
@@ -177,11 +178,11 @@ AccountingYear YearOf(const Ref<XALServer>& server, Date date) {
 
 bool CountCABalance(const Ref<XALConnect>& xalConnect, int32_t idCRCapitalAssets, int32_t idCADocRow, Date docDate,
                     CABalance& out) {
-  try {
-    Ref<XALServer> server = xalConnect->Server();
-    Ref<DataObject> rows = server->OpenQuery("SELECT * FROM CADocRow WHERE IDCRCapitalAssets = " +
-                                                 std::to_string(idCRCapitalAssets) + " ORDER BY DocDate, ID",
-                                             1, "", "");
+  return TryStep([&] {
+    const Checked<XALServer> server = Checked<XALConnect>(xalConnect)->Server();
+    const Checked<DataObject> rows = server->OpenQuery("SELECT * FROM CADocRow WHERE IDCRCapitalAssets = " +
+                                                           std::to_string(idCRCapitalAssets) + " ORDER BY DocDate, ID",
+                                                       kQueryEditable, "", "");
     Date until = docDate;
     if (until.serial == 0 && idCADocRow != 0 && rows->FindFirst("ID=" + std::to_string(idCADocRow), 0) == 0)
       until = CDate(rows->Field("DocDate"));
@@ -197,10 +198,7 @@ bool CountCABalance(const Ref<XALConnect>& xalConnect, int32_t idCRCapitalAssets
     }
     replay.ChargeMonthsBefore(until);
     out = b;
-    return true;
-  } catch (const VbError&) {
-    return false;
-  }
+  });
 }
 
 }  // namespace xal::server

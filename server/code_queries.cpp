@@ -6,17 +6,15 @@
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
 
 namespace {
 
-using internal::Require;
-
 // A field value as text, Null and Empty as "" (as "&" joins them).
-std::string FieldText(const Ref<DataObject>& obj, const std::string& field) {
+std::string FieldText(const Checked<DataObject>& obj, const std::string& field) {
   const Variant v = obj->Field(field);
   return v.IsNull() ? std::string() : CStr(v);
 }
@@ -25,14 +23,15 @@ std::string FieldText(const Ref<DataObject>& obj, const std::string& field) {
 bool NonZero(const Variant& v) { return !v.IsNull() && !v.IsEmpty() && CDbl(v) != 0; }
 
 // The value of the field that the "DXCode" setting names for the table, `defaultField` unless set.
-std::string CodeFieldValue(const Ref<DataObject>& obj, const std::string& table, const char* defaultField) {
-  const std::string field = CStr(Require(Require(obj).Connection()).Setting("DXCode", table, Variant(defaultField)));
+std::string CodeFieldValue(const Checked<DataObject>& obj, const std::string& table, const char* defaultField) {
+  const Checked<XALConnect> conn = obj->Connection();
+  const std::string field = CStr(conn->Setting("DXCode", table, Variant(defaultField)));
   return FieldText(obj, field);
 }
 
 // Appends each piece as it is computed, so a failure part-way leaves the part already built.
-void BuildDXCode(const Ref<DataObject>& pObj, std::string& out) {
-  const std::string table = UCase(CStr(Require(pObj).Property(kPropTableName)));
+void BuildDXCode(const Checked<DataObject>& pObj, std::string& out) {
+  const std::string table = UCase(CStr(pObj->Property(kPropTableName)));
   if (table == "GRBANKACCOUNT") {
     out += CodeFieldValue(pObj, table, "Name");
   } else if (table == "GRCOMPCONTPERSON") {
@@ -81,27 +80,29 @@ struct LinkedCode {
 
 // The table and code field the filter refers to. For a linked field the host names the table;
 // a failure there is ignored and leaves the table empty.
-LinkedCode LinkedCodeOf(const std::string& field, const std::string& condition, const Ref<DataObject>& source,
+LinkedCode LinkedCodeOf(const std::string& field, const std::string& condition, const Checked<DataObject>& source,
                         const std::string& queryLinkTable) {
   if (TextEquals(condition, "IN QUERY")) return {queryLinkTable, "Code"};
   LinkedCode lc;
-  try {
-    Ref<ParamList> params = Require(Require(Require(source).Connection()).Server()).NewParamList();
-    Require(params).Set("Field", Variant(field));
-    lc.table = CStr(source->CallFunction("LinkedTableName", Variant(ObjectRef(params)), 0));
-  } catch (const VbError&) {
-    lc.table.clear();
-  }
+  lc.table = TryOr(
+      [&] {
+        const Checked<XALServer> server = Checked<XALConnect>(source->Connection())->Server();
+        const Checked<ParamList> params = server->NewParamList();
+        params->Set("Field", Variant(field));
+        return CStr(source->CallFunction("LinkedTableName", Variant(ObjectRef(params.get())), 0));
+      },
+      std::string());
   lc.codeField = Mid(field, InStrRev(field, ".") + 1);
   return lc;
 }
 
 // Runs `sql` (query mode 3) and joins `render(row)` of every row with ",".
-std::string JoinRows(const Ref<DataObject>& source, const std::string& sql,
-                     const std::function<std::string(const Ref<DataObject>&)>& render) {
-  Ref<DataObject> rows = Require(Require(Require(source).Connection()).Server()).OpenQuery(sql, 3, "", "");
+std::string JoinRows(const Checked<DataObject>& source, const std::string& sql,
+                     const std::function<std::string(const Checked<DataObject>&)>& render) {
+  const Checked<XALServer> server = Checked<XALConnect>(source->Connection())->Server();
+  const Checked<DataObject> rows = server->OpenQuery(sql, kQueryReadOnly, "", "");
   std::vector<std::string> parts;
-  for (; rows && !rows->IsEOF(); rows->MoveNext()) parts.push_back(render(rows));
+  for (; !rows->IsEOF(); rows->MoveNext()) parts.push_back(render(rows));
   return Join(parts, ",");
 }
 
@@ -118,7 +119,7 @@ std::string CodeToID(const std::string& pField, const std::string& pCondition, c
   const LinkedCode lc = LinkedCodeOf(pField, pCondition, pSourceTableOB, pQueryLinkTable);
   if (lc.table.empty()) return std::string();
   return JoinRows(pSourceTableOB, "SELECT ID FROM " + lc.table + " WHERE " + lc.codeField + " In (" + codes + ")",
-                  [](const Ref<DataObject>& row) { return FieldText(row, "ID"); });
+                  [](const Checked<DataObject>& row) { return FieldText(row, "ID"); });
 }
 
 std::string IDToCode(const std::string& pField, const std::string& pCondition, const std::string& pArgument,
@@ -134,36 +135,25 @@ std::string IDToCode(const std::string& pField, const std::string& pCondition, c
   // A comma inside a code is written ",," so the list can be split again.
   return JoinRows(pSourceTableOB,
                   "SELECT " + lc.codeField + " FROM " + lc.table + " WHERE ID In (" + Join(ids, ",") + ")",
-                  [&](const Ref<DataObject>& row) { return Replace(FieldText(row, lc.codeField), ",", ",,"); });
+                  [&](const Checked<DataObject>& row) { return Replace(FieldText(row, lc.codeField), ",", ",,"); });
 }
 
 }  // namespace
 
 std::string GetDXCode(const Ref<DataObject>& pObj) {
   std::string code;
-  try {
-    BuildDXCode(pObj, code);
-  } catch (const VbError&) {
-  }
+  TryStep([&] { BuildDXCode(pObj, code); });
   return code;
 }
 
 std::string QueryCodeToID(const std::string& pField, const std::string& pCondition, const std::string& pArgument,
                           const Ref<DataObject>& pSourceTableOB, const std::string& pQueryLinkTable) {
-  try {
-    return CodeToID(pField, pCondition, pArgument, pSourceTableOB, pQueryLinkTable);
-  } catch (const VbError&) {
-    return std::string();
-  }
+  return TryOr([&] { return CodeToID(pField, pCondition, pArgument, pSourceTableOB, pQueryLinkTable); }, std::string());
 }
 
 std::string QueryIDToCode(const std::string& pField, const std::string& pCondition, const std::string& pArgument,
                           const Ref<DataObject>& pSourceTableOB, const std::string& pQueryLinkTable) {
-  try {
-    return IDToCode(pField, pCondition, pArgument, pSourceTableOB, pQueryLinkTable);
-  } catch (const VbError&) {
-    return std::string();
-  }
+  return TryOr([&] { return IDToCode(pField, pCondition, pArgument, pSourceTableOB, pQueryLinkTable); }, std::string());
 }
 
 }  // namespace xal::server

@@ -11,6 +11,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/dates.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -20,12 +21,12 @@ namespace {
 std::string Num(int32_t v) { return std::to_string(v); }
 
 // An identifier field; a missing row, Empty or Null counts as 0.
-int32_t IdField(const Ref<DataObject>& rs, const char* name) {
+int32_t IdField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
   return (v.IsEmpty() || v.IsNull()) ? 0 : CLng(v);
 }
 
-double DateField(const Ref<DataObject>& rs, const char* name) {
+double DateField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
   return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDate(v).serial;
 }
@@ -40,23 +41,23 @@ struct Customer {
 
 // The ordinary starting list: the company's list, else the list of the price-category pair;
 // 0 when there is neither.
-int32_t OrdinaryList(const Ref<XALServer>& server, int32_t article, const Customer& c) {
+int32_t OrdinaryList(const Checked<XALServer>& server, int32_t article, const Customer& c) {
   if (c.list != 0) return c.list;
   if (c.companyCat == 0) return 0;
-  Ref<DataObject> rs = server->OpenQuery(
+  const Checked<DataObject> rs = server->OpenQuery(
       "SELECT A.IDGRPriceList FROM GRPriceCatRel A, GRArticle B WHERE B.ID = " + Num(article) +
           " AND B.IDGRArticlePriceCat = A.IDGRArticlePriceCat AND A.IDGRCompanyPriceCat = " + Num(c.companyCat),
-      3, "", "");
+      kQueryReadOnly, "", "");
   if (rs->IsEOF()) return 0;
   return IdField(rs, "IDGRPriceList");
 }
 
 // The newest price row of `list` that covers `date` (an EndDate before 1900 is open); false when
 // none does.
-bool ValidPriceRow(const Ref<XALServer>& server, int32_t article, int32_t list, Date date, Currency& price) {
-  Ref<DataObject> rs = server->OpenQuery("SELECT * FROM GRPriceListRel WHERE IDGRArticle = " + Num(article) +
+bool ValidPriceRow(const Checked<XALServer>& server, int32_t article, int32_t list, Date date, Currency& price) {
+  const Checked<DataObject> rs = server->OpenQuery("SELECT * FROM GRPriceListRel WHERE IDGRArticle = " + Num(article) +
                                              " AND IDGRPriceList = " + Num(list) + " ORDER BY BeginDate DESC, EndDate",
-                                         1, "", "");
+                                         kQueryEditable, "", "");
   for (; !rs->IsEOF(); rs->MoveNext()) {
     const double begin = DateField(rs, "BeginDate");
     const double end = DateField(rs, "EndDate");
@@ -70,18 +71,19 @@ bool ValidPriceRow(const Ref<XALServer>& server, int32_t article, int32_t list, 
 }
 
 // The next list of `list`'s chain, 0 at the end (or when the list does not exist).
-int32_t NextList(const Ref<XALServer>& server, int32_t list) {
-  Ref<DataObject> rs =
-      server->OpenQuery("SELECT IDFirst, IsBruto, WithoutPriceCut FROM GRPriceList WHERE ID = " + Num(list), 1, "", "");
+int32_t NextList(const Checked<XALServer>& server, int32_t list) {
+  const Checked<DataObject> rs =
+      server->OpenQuery("SELECT IDFirst, IsBruto, WithoutPriceCut FROM GRPriceList WHERE ID = " + Num(list), kQueryEditable,
+                        "", "");
   return rs->IsEOF() ? 0 : IdField(rs, "IDFirst");
 }
 
 // The price-category markup for the list the price was found in, when the pair has one.
-Currency WithPriceCut(const Ref<XALServer>& server, Currency price, const Customer& c, int32_t list) {
-  Ref<DataObject> rs = server->OpenQuery(
+Currency WithPriceCut(const Checked<XALServer>& server, Currency price, const Customer& c, int32_t list) {
+  const Checked<DataObject> rs = server->OpenQuery(
       "SELECT A.PriceCut AS PriceCut FROM GRPriceCatRel A WHERE A.IDGRArticlePriceCat = " + Num(c.articleCat) +
           " AND A.IDGRCompanyPriceCat = " + Num(c.companyCat) + " AND A.IDGRPriceList = " + Num(list),
-      3, "", "");
+      kQueryReadOnly, "", "");
   if (rs->IsEOF()) return price;
   const Variant cut = rs->Field("PriceCut");
   const double pct = (cut.IsEmpty() || cut.IsNull()) ? 0.0 : CDbl(cut);
@@ -96,12 +98,13 @@ Currency WithPriceCut(const Ref<XALServer>& server, Currency price, const Custom
 int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t priceList) {
   const double t = std::floor(date.serial);
   if (t < 1 || priceList == 0) return priceList;
-  Ref<XALServer> server = conn->Server();
+  const Checked<XALServer> server = Checked<XALConnect>(conn)->Server();
   std::unordered_set<int32_t> seen;
   int32_t list = priceList;
   while (seen.insert(list).second) {
-    Ref<DataObject> rs =
-        server->OpenQuery("SELECT BeginDate, EndDate, IDFirst FROM GRPriceList WHERE ID = " + Num(list), 1, "", "");
+    const Checked<DataObject> rs =
+        server->OpenQuery("SELECT BeginDate, EndDate, IDFirst FROM GRPriceList WHERE ID = " + Num(list), kQueryEditable,
+                          "", "");
     if (rs->IsEOF()) return 0;
     const double b = std::floor(DateField(rs, "BeginDate"));
     const double e = std::floor(DateField(rs, "EndDate"));
@@ -116,14 +119,14 @@ int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t price
 // 0 when no list in reach holds a valid price. Failing queries reach the caller.
 Currency GetCompanyPrice(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int32_t pIDGRCompany, Date pDate) {
   const Date date = Year(pDate) < 1900 ? Today() : pDate;
-  Ref<XALServer> server = pXALConnect->Server();
+  const Checked<XALServer> server = Checked<XALConnect>(pXALConnect)->Server();
 
   Customer c;
-  Ref<DataObject> company = server->OpenQuery(
-      "SELECT IDGRPriceList, IDGRPriceListC, IDGRCompanyPriceCat FROM GRCompany WHERE ID = " + Num(pIDGRCompany), 3, "",
-      "");
-  Ref<DataObject> article =
-      server->OpenQuery("SELECT IDGRArticlePriceCat FROM GRArticle WHERE ID = " + Num(pIDGRArticle), 3, "", "");
+  const Checked<DataObject> company = server->OpenQuery(
+      "SELECT IDGRPriceList, IDGRPriceListC, IDGRCompanyPriceCat FROM GRCompany WHERE ID = " + Num(pIDGRCompany),
+      kQueryReadOnly, "", "");
+  const Checked<DataObject> article = server->OpenQuery(
+      "SELECT IDGRArticlePriceCat FROM GRArticle WHERE ID = " + Num(pIDGRArticle), kQueryReadOnly, "", "");
   c.list = IdField(company, "IDGRPriceList");
   c.ownList = IdField(company, "IDGRPriceListC");
   c.companyCat = IdField(company, "IDGRCompanyPriceCat");

@@ -11,6 +11,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/error.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -18,15 +19,15 @@ namespace xal::server {
 namespace {
 
 // A numeric field read from a query; a missing row or a Null counts as 0.
-double NumberField(const Ref<DataObject>& rs, const char* name) {
+double NumberField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
   return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDbl(v);
 }
 
 // The dated rate of `curID` on the day of `date`, when GRCurValue has one; the SQL spacing differs
 // between the two callers and is kept as each sends it.
-bool DatedRate(const Ref<XALServer>& server, const std::string& sql, double& rate) {
-  Ref<DataObject> rs = server->OpenQuery(sql, 1, "", "");
+bool DatedRate(const Checked<XALServer>& server, const std::string& sql, double& rate) {
+  const Checked<DataObject> rs = server->OpenQuery(sql, kQueryEditable, "", "");
   if (rs->IsEOF()) return false;
   rate = NumberField(rs, "ConversionRate");
   return true;
@@ -37,9 +38,9 @@ bool DatedRate(const Ref<XALServer>& server, const std::string& sql, double& rat
 // The rate of `pCurID`: its fixed rate, or the rate recorded for exactly `pRateDate` when the
 // currency keeps dated rates and a date was given. 0 when the currency does not exist.
 double CurRate(const Ref<XALConnect>& pXALConnect, int32_t pCurID, Date pRateDate) {
-  Ref<XALServer> server = pXALConnect->Server();
-  Ref<DataObject> cur = server->OpenQuery(
-      "SELECT DivThreshold, FixedRate FROM GRCurrency WHERE ID = " + std::to_string(pCurID), 1, "", "");
+  const Checked<XALServer> server = Checked<XALConnect>(pXALConnect)->Server();
+  const Checked<DataObject> cur = server->OpenQuery(
+      "SELECT DivThreshold, FixedRate FROM GRCurrency WHERE ID = " + std::to_string(pCurID), kQueryEditable, "", "");
   if (cur->IsEOF()) return 0;
   double rate = NumberField(cur, "FixedRate");
   // A zero date means "no date": the fixed rate applies. No earlier date is searched for.
@@ -78,10 +79,11 @@ Currency ConvertWithRates(Currency pAmount, double pRate1, double pRate2, bool p
 Currency Convert(const Ref<XALConnect>& pXALConnect, int32_t pCurID, Date pConvDate, Currency pAmount,
                  Currency& pRefAmount) {
   pRefAmount = pAmount;
-  Ref<XALServer> server = pXALConnect->Server();
-  Ref<DataObject> cur = server->OpenQuery(
-      "SELECT IsTriangulation, DivThreshold, FixedRate FROM GRCurrency WHERE ID=" + std::to_string(pCurID), 1, "",
-      "");
+  const Checked<XALConnect> conn = pXALConnect;
+  const Checked<XALServer> server = conn->Server();
+  const Checked<DataObject> cur = server->OpenQuery(
+      "SELECT IsTriangulation, DivThreshold, FixedRate FROM GRCurrency WHERE ID=" + std::to_string(pCurID),
+      kQueryEditable, "", "");
   if (cur->IsEOF()) return pAmount;
 
   double rate = NumberField(cur, "FixedRate");
@@ -96,7 +98,7 @@ Currency Convert(const Ref<XALConnect>& pXALConnect, int32_t pCurID, Date pConvD
   }
 
   const double first = pAmount.ToDouble() * rate;
-  const int32_t baseCurrency = CLng(pXALConnect->Setting("GRCurrency", "BaseCurrency", Variant(int32_t{0})));
+  const int32_t baseCurrency = CLng(conn->Setting("GRCurrency", "BaseCurrency", Variant(int32_t{0})));
   const double baseRate = CurRate(pXALConnect, baseCurrency, pConvDate);
   if (baseRate == 0) Raise(kErrDivByZero);
   const double second = first / baseRate;

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "runtime/convert.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -37,35 +38,36 @@ std::vector<char> BytesOf(const Variant& data) {
 }  // namespace
 
 bool Bin2File(const std::string& pFileName, const Variant& pBinData) {
-  try {
-    // Converted before the file is opened, so bad data leaves an existing file untouched.
-    const std::vector<char> bytes = BytesOf(pBinData);
-    // Truncated on open: a shorter array written over a longer file leaves no stale bytes behind.
-    std::ofstream out(pFileName, std::ios::binary | std::ios::trunc);
-    if (!out) return false;
-    out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-    out.close();
-    return !out.fail();
-  } catch (const std::exception&) {  // conversion errors and stream failures alike
-    return false;
-  }
+  // Conversion errors and stream failures alike give False.
+  return TryOr(
+      [&] {
+        // Converted before the file is opened, so bad data leaves an existing file untouched.
+        const std::vector<char> bytes = BytesOf(pBinData);
+        // Truncated on open: a shorter array written over a longer file leaves no stale bytes behind.
+        std::ofstream out(pFileName, std::ios::binary | std::ios::trunc);
+        if (!out) return false;
+        out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+        out.close();
+        return !out.fail();
+      },
+      false);
 }
 
 Variant File2Bin(const std::string& pFileName) {
-  try {
-    std::ifstream in(pFileName, std::ios::binary);
-    if (!in) return Variant();
-    // A directory opens but fails on the first read (the stream buffer throws); an empty file has
-    // nothing to give. Both are Empty.
-    const std::vector<char> bytes{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
-    if (in.bad() || bytes.empty()) return Variant();
-    std::vector<Variant> items;
-    items.reserve(bytes.size());
-    for (char c : bytes) items.emplace_back(static_cast<int16_t>(static_cast<unsigned char>(c)));
-    return Variant(SafeArray::Vector(std::move(items), 0));
-  } catch (const std::exception&) {
-    return Variant();
-  }
+  return TryOr(
+      [&] {
+        std::ifstream in(pFileName, std::ios::binary);
+        if (!in) return Variant();
+        // A directory opens but fails on the first read (the stream buffer throws); an empty file
+        // has nothing to give. Both are Empty.
+        const std::vector<char> bytes{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+        if (in.bad() || bytes.empty()) return Variant();
+        std::vector<Variant> items;
+        items.reserve(bytes.size());
+        for (char c : bytes) items.emplace_back(static_cast<int16_t>(static_cast<unsigned char>(c)));
+        return Variant(SafeArray::Vector(std::move(items), 0));
+      },
+      Variant());
 }
 
 }  // namespace xal::server

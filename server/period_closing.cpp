@@ -7,21 +7,19 @@
 
 #include <array>
 #include <cmath>
-#include <exception>
 #include <string>
 #include <vector>
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
+#include "server/internal/transaction.h"
 #include "server/module_state.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
 
 namespace {
-
-using internal::Require;
 
 // ---------------------------------------------------------------------------------------------
 // Closing messages
@@ -45,8 +43,6 @@ constexpr std::array<ClosingText, 10> kClosingTexts{{
     {"sales", "müügi"},
     {"wages", "palga"},
 }};
-
-constexpr int32_t kLangEstonian = 4;
 
 // The language of the closing texts: the connection's language, refreshed on every closing.
 thread_local int32_t tClosingLangID = 0;
@@ -99,19 +95,17 @@ const Subsystem* FindSubsystem(const std::string& name) {
   return nullptr;
 }
 
-// Callback codes.
+// The caller identifier the closing gives the host callback.
 constexpr int32_t kCallerID = 77;
-constexpr int32_t kButtonsExclamationOK = 48;
-constexpr int32_t kButtonsQuestionYesNo = 36;
-constexpr int32_t kNotifyProgressStart = 2;  // value: the number of steps that follow
-constexpr int32_t kNotifyProgressStep = 4;
+constexpr int32_t kButtonsExclamationOK = kMbOK + kMbExclamation;
+constexpr int32_t kButtonsQuestionYesNo = kMbYesNo + kMbQuestion;
 
 int32_t Ask(const std::string& prompt, int32_t buttons) {
-  return Require(CurrentCallback()).MsgBox(kCallerID, prompt, buttons, "", "", 0);
+  return Checked<IXALCallback>(CurrentCallback())->MsgBox(kCallerID, prompt, buttons, "", "", 0);
 }
 
 void Notify(int32_t kind, const Variant& value = Variant()) {
-  Require(CurrentCallback()).Notify(kCallerID, kind, "", value);
+  Checked<IXALCallback>(CurrentCallback())->Notify(kCallerID, kind, "", value);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -124,46 +118,26 @@ double WholeDays(const Variant& v) {
   return std::floor(CDate(v).serial);
 }
 
-int32_t CountOf(const Ref<XALServer>& server, const std::string& sql) {
-  Ref<DataObject> rs = server->OpenQuery(sql, 4, "", "");
+int32_t CountOf(const Checked<XALServer>& server, const std::string& sql) {
+  const Checked<DataObject> rs = server->OpenQuery(sql, kQueryForward, "", "");
   if (rs->IsEOF()) return 0;
   const Variant c = rs->Field("C");
   return (c.IsEmpty() || c.IsNull()) ? 0 : CLng(c);
 }
 
-// Runs `body` in a transaction of the connection when the host offers one: a closing that fails
-// half-way must not leave a period marked closed over balances that were never rebuilt.
-template <class Body>
-bool InTransaction(const Ref<XALConnect>& conn, Body body) {
-  const bool own = conn->BeginTransaction();
-  try {
-    const bool ok = body();
-    if (own) {
-      if (ok)
-        conn->CommitTransaction();
-      else
-        conn->RollbackTransaction();
-    }
-    return ok;
-  } catch (...) {
-    if (own) conn->RollbackTransaction();
-    throw;
-  }
-}
-
 struct Closing {
-  Ref<ParamList> params;
-  Ref<XALConnect> conn;
-  Ref<XALServer> server;
+  Checked<ParamList> params;
+  Checked<XALConnect> conn;
+  Checked<XALServer> server;
   std::string system;
   Date date;
 };
 
 // Asks the host to rebuild the balance table `table` from the flows before the closing date.
-void RebuildBalance(const Closing& c, const Ref<ParamList>& args, const char* table) {
+void RebuildBalance(const Closing& c, const Checked<ParamList>& args, const char* table) {
   args->Set("Date", Variant(c.date));
-  Ref<DataObject> balance = c.server->OpenDataObject(table);
-  Require(balance).CallFunction("ComputeBalance", Variant(args), 0);
+  const Checked<DataObject> balance = c.server->OpenDataObject(table);
+  balance->CallFunction("ComputeBalance", Variant(args.get()), 0);
 }
 
 // Closes one subsystem; False when the user refuses or reserved documents block it.
@@ -181,8 +155,9 @@ bool CloseSubsystem(const Closing& c, const Subsystem& sys) {
     certify = true;
   }
 
-  // The user has answered; what follows is written as one unit.
-  return InTransaction(c.conn, [&] {
+  // The user has answered; what follows is written as one unit: a closing that fails half-way
+  // must not leave a period marked closed over balances that were never rebuilt.
+  return internal::InTransaction(*c.conn, [&] {
     if (certify) {
       Notify(kNotifyProgressStart, Variant(int32_t{4}));
       c.conn->Execute("UPDATE GDocument SET IsCertified = True WHERE IsCertified=False" + before, 0);
@@ -192,7 +167,7 @@ bool CloseSubsystem(const Closing& c, const Subsystem& sys) {
     }
     c.conn->SetSetting("DateFixed", sys.name, Variant(static_cast<int32_t>(WholeDays(Variant(c.date)))));
 
-    Ref<ParamList> args = c.server->NewParamList();
+    const Checked<ParamList> args = c.server->NewParamList();
     args->SetObject("CallBack", CurrentCallback());
     if (TextEquals(sys.name, "Store")) {
       RebuildBalance(c, args, "DBalanceStore");
@@ -222,7 +197,7 @@ bool CloseBooking(const Closing& c) {
     const Variant fixed = c.conn->Setting("DateFixed", name, TextEquals(name, "Wages") ? Variant(int32_t{0}) : Variant());
     if (WholeDays(fixed) < day) {
       c.params->Set("SystemName", Variant(std::string(name)));
-      if (!CloseWith(c.params)) return false;
+      if (!CloseWith(c.params.get())) return false;
     }
   }
 
@@ -232,7 +207,7 @@ bool CloseBooking(const Closing& c) {
     if (Ask(GetClosingText(2, {"", CStr(Variant(c.date))}), kButtonsQuestionYesNo) != kAnswerYes) return false;
     certify = true;
   }
-  return InTransaction(c.conn, [&] {
+  return internal::InTransaction(*c.conn, [&] {
     if (certify) {
       c.conn->Execute("UPDATE BBooking SET IsCertified=TRUE" + before, 4);
       Notify(kNotifyProgressStep);
@@ -245,13 +220,12 @@ bool CloseBooking(const Closing& c) {
 bool CloseWith(const Ref<ParamList>& params) {
   Closing c;
   c.params = params;
-  c.conn = std::dynamic_pointer_cast<XALConnect>(Require(params).Item("XALConnect").AsObject());
-  Require(c.conn);
-  tClosingLangID = CLng(c.conn->Property(8));
+  c.conn = std::dynamic_pointer_cast<XALConnect>(c.params->Item("XALConnect").AsObject());
+  tClosingLangID = CLng(c.conn->Property(kConnPropLanguage));
   c.server = c.conn->Server();
-  Require(c.server);
-  c.system = CStr(params->Item("SystemName"));
-  c.date = CDate(params->Item("CloseDate"));
+  Require(c.server.get());  // the closing needs the server on every path
+  c.system = CStr(c.params->Item("SystemName"));
+  c.date = CDate(c.params->Item("CloseDate"));
 
   const bool booking = TextEquals(c.system, "Booking");
   const double accountingFixed = WholeDays(c.conn->Setting("DateFixed", "Booking", Variant(int32_t{0})));
@@ -267,11 +241,7 @@ bool CloseWith(const Ref<ParamList>& params) {
 
 // Errors are trapped: any failure ends the closing with False and no message.
 bool ClosePeriod(const Ref<ParamList>& pParams) {
-  try {
-    return CloseWith(pParams);
-  } catch (const std::exception&) {
-    return false;
-  }
+  return TryOr([&] { return CloseWith(pParams); }, false);
 }
 
 }  // namespace xal::server

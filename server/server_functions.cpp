@@ -5,6 +5,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
+#include "runtime/trap.h"
 #include "server/aggregation.h"
 #include "server/balances.h"
 #include "server/ca_balance.h"
@@ -50,16 +51,9 @@ Variant ServerFunctions::Execute(const std::string& pName, Ref<ParamList>& pPara
   CallbackScope scope;
   // Execute never fails: a step that raises is skipped. A closing that fails answers False, so a
   // caller can never mistake a failure for a closed period.
-  try {
-    InstallCallback(params);
-  } catch (const std::exception&) {
-  }
+  TryStep([&] { InstallCallback(params); });
   if (!TextEquals(pName, "ClosePeriod")) return Variant();
-  try {
-    return Variant(server::ClosePeriod(params));
-  } catch (const std::exception&) {
-    return Variant(false);
-  }
+  return Variant(TryOr([&] { return server::ClosePeriod(params); }, false));
 }
 
 bool ServerFunctions::CheckCategory(Ref<XALConnect>& pXALConnect, const std::string& pTableName, int32_t pID,

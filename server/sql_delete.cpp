@@ -6,14 +6,12 @@
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
 
 namespace {
-
-using internal::Require;
 
 // Rows per chunk, and the count above which the statement is chunked at all.
 constexpr int32_t kChunkRows = 10000;
@@ -26,8 +24,9 @@ void DeleteInChunks(XALConnect& conn, const std::string& sql) {
   // verb; a later one (inside a literal) must stay as it is so the count sees the same condition.
   const std::string counting =
       Replace(UCase(sql), "DELETE ", "SELECT COUNT(*) AS Cnt, MIN(ID) AS MnID, MAX(ID) AS MxID ", 1, 1);
-  Ref<DataObject> stats = Require(conn.Server()).OpenQuery(counting, 4, "", "");
-  if (!stats || stats->IsEOF()) Raise(kErrInvalidCall, "The delete counted no rows");
+  const Checked<XALServer> server = conn.Server();
+  const Checked<DataObject> stats = server->OpenQuery(counting, kQueryForward, "", "");
+  if (stats->IsEOF()) Raise(kErrInvalidCall, "The delete counted no rows");
   if (CDbl(stats->Field("Cnt")) <= kChunkRows) return;
   const int32_t last = CLng(stats->Field("MxID"));
   for (int64_t bound = int64_t{CLng(stats->Field("MnID"))} + kChunkRows; bound < last; bound += kChunkRows)
@@ -37,15 +36,14 @@ void DeleteInChunks(XALConnect& conn, const std::string& sql) {
 }  // namespace
 
 bool SQLDelete(const Ref<XALConnect>& pXALConnect, const std::string& pSQLString, int32_t pOptions) {
-  try {
-    if (Trim(pSQLString).empty()) return false;
-    XALConnect& conn = Require(pXALConnect);
-    if (conn.DatabaseKind() == 1) DeleteInChunks(conn, pSQLString);
-    conn.Execute(pSQLString, pOptions);
-    return true;
-  } catch (const VbError&) {
-    return false;
-  }
+  if (Trim(pSQLString).empty()) return false;
+  return TryStep([&] {
+    const Checked<XALConnect> conn = pXALConnect;
+    // Only the file database is chunked; the SQL server, and any kind the host adds, take the
+    // statement whole.
+    if (conn->DatabaseKind() == kDbFile) DeleteInChunks(*conn, pSQLString);
+    conn->Execute(pSQLString, pOptions);
+  });
 }
 
 }  // namespace xal::server

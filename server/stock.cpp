@@ -13,6 +13,7 @@
 #include "runtime/dates.h"
 #include "runtime/error.h"
 #include "runtime/text.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -22,8 +23,6 @@ namespace {
 // ---------------------------------------------------------------------------------------------
 // Shared helpers
 // ---------------------------------------------------------------------------------------------
-
-constexpr int32_t kServerDialect = 2;
 
 // The cost settings, read by the first CountCost of a thread and reused until a reset. DateFixed
 // is read only by the running-average computation of the file dialect.
@@ -38,24 +37,24 @@ thread_local CostOptionCache tCostOptions;
 std::string Num(int32_t v) { return std::to_string(v); }
 
 // A numeric field; a missing row, Empty or Null counts as 0 (a part of a union with no rows).
-double NumberField(const Ref<DataObject>& rs, const char* name) {
+double NumberField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
   return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDbl(v);
 }
 
 // A row identifier; a store that is not there (Null) is the same as none (0).
-int32_t IdField(const Ref<DataObject>& rs, const char* name) {
+int32_t IdField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
   return (v.IsEmpty() || v.IsNull()) ? 0 : CLng(v);
 }
 
-bool FlagSetting(const Ref<XALConnect>& conn, const char* category, const char* name) {
+bool FlagSetting(const Checked<XALConnect>& conn, const char* category, const char* name) {
   const Variant v = conn->Setting(category, name, Variant(false));
   return !(v.IsEmpty() || v.IsNull()) && CBool(v);
 }
 
 // The date up to which store periods are closed; 0 when stores were never closed.
-Date DateFixedSetting(const Ref<XALConnect>& conn) {
+Date DateFixedSetting(const Checked<XALConnect>& conn) {
   const Variant v = conn->Setting("DateFixed", "Store", Variant(int32_t{0}));
   return (v.IsEmpty() || v.IsNull()) ? Date() : CDate(v);
 }
@@ -142,12 +141,13 @@ std::string FileSetBalanceSql(int32_t article, const BalanceFilters& f, Date dat
 }
 
 // Adds the Q of every row to `total` as it goes, so that a failure leaves the sum so far.
-void FileBalance(const Ref<XALConnect>& conn, int32_t article, int32_t store, int32_t row, bool preReservations,
+void FileBalance(const Checked<XALConnect>& conn, int32_t article, int32_t store, int32_t row, bool preReservations,
                  bool sets, double& total) {
   const Date dateFixed = DateFixedSetting(conn);
   const BalanceFilters f = MakeBalanceFilters(store, row, preReservations);
   const std::string sql = sets ? FileSetBalanceSql(article, f, dateFixed) : FileBalanceSql(article, f, dateFixed);
-  Ref<DataObject> rs = conn->Server()->OpenQuery(sql, 3, "", "");
+  const Checked<XALServer> server = conn->Server();
+  const Checked<DataObject> rs = server->OpenQuery(sql, kQueryReadOnly, "", "");
   while (!rs->IsEOF()) {
     total += NumberField(rs, "Q");
     rs->MoveNext();
@@ -190,10 +190,11 @@ std::string ServerRowSql(int32_t article, int32_t store, int32_t row, bool preRe
   return sql;
 }
 
-void ServerBalance(const Ref<XALConnect>& conn, int32_t article, int32_t store, int32_t row, bool preReservations,
+void ServerBalance(const Checked<XALConnect>& conn, int32_t article, int32_t store, int32_t row, bool preReservations,
                    bool sets, double& total) {
-  Ref<XALServer> server = conn->Server();
-  Ref<DataObject> rs = server->OpenQuery(ServerBalanceSql(article, store, preReservations, sets), sets ? 11 : 3, "", "");
+  const Checked<XALServer> server = conn->Server();
+  const Checked<DataObject> rs = server->OpenQuery(ServerBalanceSql(article, store, preReservations, sets),
+                                                   sets ? kQueryServer : kQueryReadOnly, "", "");
   double q = NumberField(rs, "Quantity") + NumberField(rs, "RQuantity");
   if (preReservations) q += NumberField(rs, "PQuantity");
   total = q;
@@ -201,7 +202,7 @@ void ServerBalance(const Ref<XALConnect>& conn, int32_t article, int32_t store, 
 
   // The given row applied to the current balance: into the store (or from outside) adds, out of
   // the store (or to outside) subtracts.
-  Ref<DataObject> r = server->OpenQuery(ServerRowSql(article, store, row, preReservations), 3, "", "");
+  const Checked<DataObject> r = server->OpenQuery(ServerRowSql(article, store, row, preReservations), kQueryReadOnly, "", "");
   if (r->IsEOF()) return;
   const double base = NumberField(r, "BaseQuantity");
   const int32_t receiver = IdField(r, "IDReceiverStore");
@@ -255,18 +256,20 @@ std::string PriceChainSql(int32_t priceList, const std::string& t, int32_t artic
 
 // A production article's cost: its price in the chain of the store's price list ("PC" articles
 // use the store's list for completions), on the date of document `doc` or today.
-Variant ProductionCost(const Ref<XALServer>& server, int32_t article, int32_t store, int32_t doc,
+Variant ProductionCost(const Checked<XALServer>& server, int32_t article, int32_t store, int32_t doc,
                        const std::string& type) {
   const std::string storeSql =
       TextEquals(type, "PC") ? "SELECT IDComplPriceList AS IDGRPriceList FROM DRStore WHERE ID = " + Num(store)
                              : "SELECT IDGRPriceList FROM DRStore WHERE ID = " + Num(store);
-  const int32_t priceList = IdField(server->OpenQuery(storeSql, 1, "", ""), "IDGRPriceList");
+  const int32_t priceList = IdField(server->OpenQuery(storeSql, kQueryEditable, "", ""), "IDGRPriceList");
   Date when = Today();
   if (doc != 0) {
-    Ref<DataObject> d = server->OpenQuery("SELECT DocDate FROM GDocument WHERE ID = " + Num(doc), 1, "", "");
+    const Checked<DataObject> d =
+        server->OpenQuery("SELECT DocDate FROM GDocument WHERE ID = " + Num(doc), kQueryEditable, "", "");
     if (!d->IsEOF()) when = CDate(d->Field("DocDate"));
   }
-  Ref<DataObject> price = server->OpenQuery(PriceChainSql(priceList, SQLDate(Variant(when)), article), 1, "", "");
+  const Checked<DataObject> price =
+      server->OpenQuery(PriceChainSql(priceList, SQLDate(Variant(when)), article), kQueryEditable, "", "");
   return price->IsEOF() ? Variant(int16_t{0}) : price->Field("Price");
 }
 
@@ -321,24 +324,24 @@ std::string ServerRunningCostSql(int32_t article, int32_t store, int32_t doc) {
 }
 
 // The cost from the balances: a running average, or the stored cost per store or per article.
-Variant BalanceCost(const Ref<XALConnect>& conn, int32_t article, int32_t store, int32_t doc) {
+Variant BalanceCost(const Checked<XALConnect>& conn, int32_t article, int32_t store, int32_t doc) {
   CostOptionCache& opt = tCostOptions;
-  Ref<XALServer> server = conn->Server();
+  const Checked<XALServer> server = conn->Server();
   const int32_t costStore = opt.costByStore ? store : 0;
-  Ref<DataObject> rs;
+  Checked<DataObject> rs;
   if (opt.runningCost) {
-    if (conn->DatabaseKind() == kServerDialect) {
-      rs = server->OpenQuery(ServerRunningCostSql(article, costStore, doc), 11, "", "");
+    if (IsServerDialect(conn->DatabaseKind())) {
+      rs = server->OpenQuery(ServerRunningCostSql(article, costStore, doc), kQueryServer, "", "");
     } else {
       if (!opt.loaded) opt.dateFixed = DateFixedSetting(conn);
-      rs = server->OpenQuery(FileRunningCostSql(article, costStore, doc, opt.dateFixed), 3, "", "");
+      rs = server->OpenQuery(FileRunningCostSql(article, costStore, doc, opt.dateFixed), kQueryReadOnly, "", "");
     }
   } else if (opt.costByStore) {
     rs = server->OpenQuery("SELECT Cost FROM DCurBalanceStore WHERE IDDRStore = " + Num(store) +
                                " AND IDGRArticle = " + Num(article),
-                           3, "", "");
+                           kQueryReadOnly, "", "");
   } else {
-    rs = server->OpenQuery("SELECT Cost FROM GRArticle WHERE ID = " + Num(article), 3, "", "");
+    rs = server->OpenQuery("SELECT Cost FROM GRArticle WHERE ID = " + Num(article), kQueryReadOnly, "", "");
   }
   return rs->IsEOF() ? Variant() : rs->Field("Cost");
 }
@@ -351,17 +354,17 @@ Variant BalanceCost(const Ref<XALConnect>& conn, int32_t article, int32_t store,
 
 // The quantity of `pIDGRArticle` in store `pIDDRStore` (0: all stores), with row `pIDDDStoreDRow`
 // left out (file dialect) or applied (server dialect). Errors are trapped: the result is then the
-// quantity summed before the failure.
+// quantity summed before the failure (0 when the host gave no connection or server).
 double CountStockBalance(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int32_t pIDDRStore,
                          int32_t pIDDDStoreDRow, bool pCountPreReservations, bool pCountSets) {
   double total = 0;
-  try {
-    if (pXALConnect->DatabaseKind() == kServerDialect)
-      ServerBalance(pXALConnect, pIDGRArticle, pIDDRStore, pIDDDStoreDRow, pCountPreReservations, pCountSets, total);
+  TryStep([&] {
+    const Checked<XALConnect> conn = pXALConnect;
+    if (IsServerDialect(conn->DatabaseKind()))
+      ServerBalance(conn, pIDGRArticle, pIDDRStore, pIDDDStoreDRow, pCountPreReservations, pCountSets, total);
     else
-      FileBalance(pXALConnect, pIDGRArticle, pIDDRStore, pIDDDStoreDRow, pCountPreReservations, pCountSets, total);
-  } catch (const VbError&) {
-  }
+      FileBalance(conn, pIDGRArticle, pIDDRStore, pIDDDStoreDRow, pCountPreReservations, pCountSets, total);
+  });
   return total;
 }
 
@@ -369,16 +372,17 @@ double CountStockBalance(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticl
 // exists. Nothing is trapped.
 Variant CountCost(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int32_t pIDDRStore, int32_t pIDDoc,
                   bool pResetOptions, const std::string& pArticleType) {
+  const Checked<XALConnect> conn = pXALConnect;
   CostOptionCache& opt = tCostOptions;
   if (pResetOptions) opt.loaded = false;
   if (!opt.loaded) {
-    opt.costByStore = FlagSetting(pXALConnect, "CostCounting", "CostByStore");
-    opt.runningCost = FlagSetting(pXALConnect, "CostCounting", "RunningCost");
+    opt.costByStore = FlagSetting(conn, "CostCounting", "CostByStore");
+    opt.runningCost = FlagSetting(conn, "CostCounting", "RunningCost");
   }
 
-  Ref<XALServer> server = pXALConnect->Server();
-  Ref<DataObject> art = server->OpenQuery("SELECT ArticleType, Cost FROM GRArticle WHERE ID = " + Num(pIDGRArticle),
-                                          3, "", "");
+  const Checked<XALServer> server = conn->Server();
+  const Checked<DataObject> art =
+      server->OpenQuery("SELECT ArticleType, Cost FROM GRArticle WHERE ID = " + Num(pIDGRArticle), kQueryReadOnly, "", "");
   Variant result;
   bool decided = false;
   if (!art->IsEOF()) {
@@ -395,7 +399,7 @@ Variant CountCost(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int3
       decided = true;
     }
   }
-  if (!decided) result = BalanceCost(pXALConnect, pIDGRArticle, pIDDRStore, pIDDoc);
+  if (!decided) result = BalanceCost(conn, pIDGRArticle, pIDDRStore, pIDDoc);
   opt.loaded = true;
   return result;
 }

@@ -8,20 +8,13 @@
 #include <string>
 
 #include "runtime/convert.h"
-#include "runtime/error.h"
 #include "runtime/text.h"
-#include "server/internal/require.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
 
 namespace {
-
-using internal::Require;
-
-// Server properties that put row rights in force (either one is enough).
-constexpr int32_t kPropRowRights = 8;
-constexpr int32_t kPropRowRightsAlt = 50;
 
 bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
 
@@ -32,8 +25,8 @@ bool CatalogueFlag(const Ref<ParamList>& entry, const char* name) { return entry
 // The rights category of object type `xalType`, or "" when its rights are not kept by category.
 std::string RightsCategory(XALServer& server, const std::string& xalType) {
   Ref<ParamList> entry;
-  Ref<ParamList> catalogue = server.TableCatalogue();
-  if (catalogue && catalogue->Exists(xalType)) {
+  const Checked<ParamList> catalogue = server.TableCatalogue();
+  if (catalogue->Exists(xalType)) {
     const Variant item = catalogue->Item(xalType);
     if (item.IsObject()) entry = std::dynamic_pointer_cast<ParamList>(item.AsObject());
   }
@@ -49,9 +42,9 @@ std::string RightsCategory(XALServer& server, const std::string& xalType) {
 
 // The ids of the rows of `xalType` that satisfy `condition`, joined with ",".
 std::string IdList(XALServer& server, const std::string& xalType, const std::string& condition) {
-  Ref<DataObject> rs = server.OpenQuery(xalType, 3, condition, "ID");
+  const Checked<DataObject> rs = server.OpenQuery(xalType, kQueryReadOnly, condition, "ID");
   std::string ids;
-  for (Require(rs).MoveFirst(); !rs->IsEOF(); rs->MoveNext()) {
+  for (rs->MoveFirst(); !rs->IsEOF(); rs->MoveNext()) {
     if (!ids.empty()) ids += ",";
     ids += CStr(rs->Field("ID"));
   }
@@ -61,79 +54,79 @@ std::string IdList(XALServer& server, const std::string& xalType, const std::str
 // "SELECT A23.ID FROM … WHERE …" over `xalType`, the host turning `condition` (which may follow
 // links of the table) into the joins and the condition.
 std::string SubSelect(XALServer& server, const std::string& xalType, const std::string& condition) {
-  Ref<DataObject> ob = server.OpenDataObject(xalType);
-  Ref<ParamList> params = server.NewParamList();
+  const Checked<DataObject> ob = server.OpenDataObject(xalType);
+  const Checked<ParamList> params = server.NewParamList();
   params->Set("SelectQuery", Variant(condition + "<<<23>>>"));
   params->Set("LeftJoin", Variant(true));
-  Require(ob).CallFunction("ParseFields", Variant(params), 0);
+  ob->CallFunction("ParseFields", Variant(params.get()), 0);
   return "SELECT A23.ID FROM " + CStr(params->Item("From")) + " WHERE " + CStr(params->Item("Where"));
+}
+
+// GetTableFilter without its trap: raises when the host fails or answers Nothing.
+std::string TableFilter(const Checked<XALConnect>& conn, const std::string& xalType, bool idListOnly,
+                        const std::string& alias, bool subSelect) {
+  const Checked<XALServer> serverRef = conn->Server();
+  XALServer& server = *serverRef;
+  if (!IsTrue(server.Property(kServerPropRowRights)) && !IsTrue(server.Property(kServerPropRowRightsAlt))) return "";
+
+  const std::string user = std::to_string(conn->UserID());
+  const std::string category = RightsCategory(server, xalType);
+  if (category.empty()) return "";
+
+  const Checked<DataObject> right = server.OpenQuery(
+      "select fcondition from xalurights where idxaluser = " + user + " and objectname = " + SQLText(xalType) +
+          " and category = " + SQLText(category) + " and factive <> 0",
+      kQueryReadOnly, "", "");
+  if (right->IsEOF()) return "";
+  const Variant text = right->Field("FCondition");
+  std::string c = text.IsNull() ? std::string() : Trim(CStr(text));
+  if (c.empty()) return "";
+
+  c = Replace(c, "#UID", user, 1, -1, CompareMode::Text);
+  if (idListOnly) return IdList(server, xalType, Replace(c, "#.", ""));
+  if (subSelect) return SubSelect(server, xalType, Replace(c, "#.", ""));
+  return Replace(c, "#.", alias.empty() ? std::string() : alias + ".");
 }
 
 }  // namespace
 
 std::string GetTableFilter(const Ref<XALConnect>& xalConnect, const std::string& xalType, bool idListOnly,
                            const std::string& alias, bool subSelect) {
-  try {
-    XALConnect& conn = Require(xalConnect);
-    Ref<XALServer> serverRef = conn.Server();
-    XALServer& server = Require(serverRef);
-    if (!IsTrue(server.Property(kPropRowRights)) && !IsTrue(server.Property(kPropRowRightsAlt))) return "";
-
-    const std::string user = std::to_string(conn.UserID());
-    const std::string category = RightsCategory(server, xalType);
-    if (category.empty()) return "";
-
-    Ref<DataObject> right = server.OpenQuery(
-        "select fcondition from xalurights where idxaluser = " + user + " and objectname = " + SQLText(xalType) +
-            " and category = " + SQLText(category) + " and factive <> 0",
-        3, "", "");
-    if (Require(right).IsEOF()) return "";
-    const Variant text = right->Field("FCondition");
-    std::string c = text.IsNull() ? std::string() : Trim(CStr(text));
-    if (c.empty()) return "";
-
-    c = Replace(c, "#UID", user, 1, -1, CompareMode::Text);
-    if (idListOnly) return IdList(server, xalType, Replace(c, "#.", ""));
-    if (subSelect) return SubSelect(server, xalType, Replace(c, "#.", ""));
-    return Replace(c, "#.", alias.empty() ? std::string() : alias + ".");
-  } catch (const VbError&) {
-    return "";
-  }
+  return TryOr([&] { return TableFilter(xalConnect, xalType, idListOnly, alias, subSelect); }, std::string());
 }
 
 // True when record `pID` holds no category of `pCatID`'s group other than `pCatID` itself.
-// A category with an empty group never conflicts.
+// A category with an empty group never conflicts. The groups are compared by the host, whose text
+// comparison ignores case like the component's own (TextEquals): "COLOR" and "color" are one group
+// here and in the merge of categories.
 bool CheckCategory(const Ref<XALConnect>& pXALConnect, const std::string& pTableName, int32_t pID, int32_t pCatID) {
   const std::string& t = pTableName;
   const std::string id = std::to_string(pID), cat = std::to_string(pCatID);
-  Ref<DataObject> rs = Require(Require(pXALConnect).Server())
-                           .OpenQuery("SELECT REL.ID FROM " + t + "Cat C, " + t + "Cat CNew, " + t + "CatRel REL" +
+  const Checked<XALServer> server = Checked<XALConnect>(pXALConnect)->Server();
+  const Checked<DataObject> rs = server->OpenQuery("SELECT REL.ID FROM " + t + "Cat C, " + t + "Cat CNew, " + t + "CatRel REL" +
                                           " WHERE REL.ID" + t + "=" + id + " AND C.ID=REL.ID" + t + "Cat" +
                                           " AND CNew.ID=" + cat + " AND CNew.Category=C.Category" +
                                           " AND CNew.Category<>'' AND NOT(REL.ID" + t + "=" + id + " AND REL.ID" +
                                           t + "Cat=" + cat + ")",
-                                      4, "", "");
-  return Require(rs).IsEOF();
+                                      kQueryForward, "", "");
+  return rs->IsEOF();
 }
 
 // Stored options of type "ID" that name record `oldID` of `tableName` are made to name `newID`
 // (an empty text when it is 0); the host is then told to drop what it has cached of them.
 bool ResetOptions(const Ref<XALConnect>& conn, const std::string& tableName, int32_t oldID, int32_t newID) {
-  try {
-    const std::string table = Trim(tableName);
-    if (table.empty() || oldID == 0) return false;
-    XALConnect& c = Require(conn);
+  const std::string table = Trim(tableName);
+  if (table.empty() || oldID == 0) return false;
+  return TryStep([&] {
+    const Checked<XALConnect> c = conn;
     const std::string value = newID == 0 ? SQLText("") : std::to_string(newID);
-    c.Execute("UPDATE XALUserOption O, XALOptionList L SET O.OptValue=" + value +
-                  " WHERE O.Category=L.Category AND O.Name=L.Name AND O.OptValue=" + SQLText(std::to_string(oldID)) +
-                  " AND L.TableName=" + SQLText(table) + " AND L.Type='ID'",
-              4);
-    Ref<XALServer> server = c.Server();
-    c.ServerCommand("ResetOptions", Require(server).NewParamList());
-    return true;
-  } catch (const VbError&) {
-    return false;
-  }
+    c->Execute("UPDATE XALUserOption O, XALOptionList L SET O.OptValue=" + value +
+                   " WHERE O.Category=L.Category AND O.Name=L.Name AND O.OptValue=" + SQLText(std::to_string(oldID)) +
+                   " AND L.TableName=" + SQLText(table) + " AND L.Type='ID'",
+               4);
+    const Checked<XALServer> server = c->Server();
+    c->ServerCommand("ResetOptions", server->NewParamList());
+  });
 }
 
 }  // namespace xal::server

@@ -9,6 +9,7 @@
 #include "runtime/convert.h"
 #include "runtime/format.h"
 #include "runtime/text.h"
+#include "runtime/trap.h"
 #include "server/sql_utils.h"
 
 namespace xal::server {
@@ -165,7 +166,8 @@ std::array<std::string, 4> CurrencyNames(const std::string& lang, const std::str
 std::string VerbalSum(const Variant& pToConvert, const std::string& pConvLang, const std::string& pCurCode,
                       bool pUpperCase, const std::string&, const std::string&) {
   std::string result;
-  try {
+  // Appends as it goes, so an error leaves the text built so far.
+  TryStep([&] {
     Currency a = CCur(Round(pToConvert, 2));
     const bool neg = a.raw() < 0;
     if (neg) a = -a;
@@ -192,8 +194,7 @@ std::string VerbalSum(const Variant& pToConvert, const std::string& pConvLang, c
     result += w.conjunction;
     result += (cents <= 9 ? "0" : "") + std::to_string(cents) + " ";
     result += names[cents == 1 ? 2 : 3];
-  } catch (const VbError&) {
-  }
+  });
   return result;
 }
 

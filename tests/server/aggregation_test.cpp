@@ -7,6 +7,7 @@
 
 #include "server/internal/work_table.h"
 #include "server/server_functions.h"
+#include "server/table_filters.h"
 #include "sqlite_host_support.h"
 
 namespace xal::server::testing {
@@ -156,6 +157,28 @@ TEST_P(AggrRecTest, CategoriesOfOneGroupMerge) {
   ASSERT_TRUE(Merge("GRArticleCat", 1, 2, true, err)) << err;
   EXPECT_EQ(Rows("GRArticleCatRel", "IDGRArticle, IDGRArticleCat"), "(1,2)(3,3)");
   EXPECT_EQ(Rows("GRArticleCat", "ID"), "(2)(3)");
+}
+
+// Category groups are codes and compare without regard to case, in the merge as in CheckCategory:
+// two categories are one group exactly when a record may not hold both, and then they merge.
+TEST_P(AggrRecTest, CategoryGroupsDifferingInCaseAreOneGroup) {
+  Sql("INSERT INTO GRArticleCat (ID, Code, Category) VALUES"
+      " (4, 'C4', 'COLOR'), (5, 'C5', 'color'), (6, 'C6', 'SIZE'), (7, 'C7', 'Weight');"
+      "INSERT INTO GRArticleCatRel (ID, IDGRArticle, IDGRArticleCat) VALUES (3, 2, 4), (4, 4, 6);");
+  struct Row {
+    int32_t holder, held, other;
+    bool oneGroup;
+  } rows[] = {
+      {2, 4, 5, true},   // "COLOR" and "color"
+      {4, 6, 7, false},  // "SIZE" and "Weight"
+  };
+  for (const auto& r : rows) {
+    SCOPED_TRACE(std::to_string(r.other) + " -> " + std::to_string(r.held));
+    EXPECT_EQ(CheckCategory(conn, "GRArticle", r.holder, r.other), !r.oneGroup);
+    std::string err;
+    EXPECT_EQ(Merge("GRArticleCat", r.other, r.held, true, err), r.oneGroup) << err;
+    EXPECT_EQ(Count("SELECT count(*) FROM GRArticleCat WHERE ID = " + std::to_string(r.other)), r.oneGroup ? 0 : 1);
+  }
 }
 
 // Refusals: nothing changes, and "ErrText" is the general text with the reason after " - ", in
