@@ -8,6 +8,7 @@
 
 #include "host/host_error.h"
 #include "host/sql_functions.h"
+#include "runtime/ascii.h"
 #include "runtime/error.h"
 #include "runtime/text.h"
 
@@ -17,12 +18,6 @@ namespace {
 [[noreturn]] void Fail(sqlite3* db, std::string_view sql) {
   std::string msg = db ? sqlite3_errmsg(db) : "cannot open database";
   Raise(kErrSql, msg + " [" + std::string(sql.substr(0, 400)) + "]");
-}
-
-bool StartsWithNoCase(const char* s, const char* prefix) {
-  for (; *prefix; ++s, ++prefix)
-    if (!*s || std::toupper(static_cast<unsigned char>(*s)) != *prefix) return false;
-  return true;
 }
 }  // namespace
 
@@ -42,13 +37,13 @@ struct Database::Stmt {
 
 ColumnKind KindFromDeclType(const char* d) {
   if (!d) return ColumnKind::Auto;
-  if (StartsWithNoCase(d, "DATE")) return ColumnKind::Date;
-  if (StartsWithNoCase(d, "CURRENCY")) return ColumnKind::Currency;
-  if (StartsWithNoCase(d, "BOOL")) return ColumnKind::Boolean;
-  if (StartsWithNoCase(d, "INT")) return ColumnKind::Integer;
-  if (StartsWithNoCase(d, "REAL") || StartsWithNoCase(d, "DOUBLE") || StartsWithNoCase(d, "FLOAT"))
+  if (AsciiStartsWithNoCase(d, "DATE")) return ColumnKind::Date;
+  if (AsciiStartsWithNoCase(d, "CURRENCY")) return ColumnKind::Currency;
+  if (AsciiStartsWithNoCase(d, "BOOL")) return ColumnKind::Boolean;
+  if (AsciiStartsWithNoCase(d, "INT")) return ColumnKind::Integer;
+  if (AsciiStartsWithNoCase(d, "REAL") || AsciiStartsWithNoCase(d, "DOUBLE") || AsciiStartsWithNoCase(d, "FLOAT"))
     return ColumnKind::Real;
-  if (StartsWithNoCase(d, "TEXT") || StartsWithNoCase(d, "VARCHAR") || StartsWithNoCase(d, "CHAR"))
+  if (AsciiStartsWithNoCase(d, "TEXT") || AsciiStartsWithNoCase(d, "VARCHAR") || AsciiStartsWithNoCase(d, "CHAR"))
     return ColumnKind::Text;
   return ColumnKind::Auto;
 }

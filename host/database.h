@@ -9,6 +9,7 @@
 #include <string_view>
 #include <vector>
 
+#include "runtime/text.h"
 #include "runtime/variant.h"
 
 struct sqlite3;
@@ -55,6 +56,10 @@ class Database {
   sqlite3* db_ = nullptr;
   std::string path_;
 };
+
+// A name (table, column, alias) as an SQLite quoted identifier: between double quotes, each double
+// quote inside doubled, so that any name the host is handed stays one name in the SQL it builds.
+inline std::string QuoteName(std::string_view name) { return DoubleQuoted(name); }
 
 // Converts a Variant to what SQLite stores: dates as serial days, currency as REAL, Booleans as
 // -1/0, Empty and Null as NULL.

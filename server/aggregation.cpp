@@ -16,6 +16,7 @@
 #include "runtime/text.h"
 #include "server/internal/require.h"
 #include "server/internal/work_table.h"
+#include "server/sql_utils.h"
 #include "server/table_filters.h"
 
 namespace xal::server {
@@ -41,7 +42,6 @@ constexpr int32_t kLogRegisterChanges = 16;
 // How many work-table names a merge tries before it gives up.
 constexpr int kWorkTableTries = 20;
 
-std::string Num(int32_t v) { return std::to_string(v); }
 
 // Int(10000 × Rnd + 1) from a generator seeded once per thread, or the test's source.
 int32_t NextWorkTableNumber() {
@@ -76,8 +76,7 @@ struct Merge {
 // A field that may be absent from the table (not every register has a Code); empty then.
 std::string OptionalText(const Ref<DataObject>& obj, const char* field) {
   try {
-    const Variant v = obj->Field(field);
-    return (v.IsEmpty() || v.IsNull()) ? std::string() : CStr(v);
+    return ValueOr(obj->Field(field), std::string());
   } catch (const std::exception&) {
     return std::string();
   }
@@ -216,8 +215,6 @@ std::string RunMerge(const Merge& m) {
   if (isArticle || isStore) RefreshCurrentBalances(m);
   return std::string();
 }
-
-bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
 
 }  // namespace
 

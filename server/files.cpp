@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "runtime/convert.h"
-#include "server/sql_utils.h"
+#include "server/files.h"
 
 namespace xal::server {
 

@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "collections/ui_strings.h"
 #include "runtime/convert.h"
 #include "runtime/text.h"
 #include "server/internal/require.h"
@@ -56,17 +57,7 @@ thread_local int32_t tClosingLangID = 0;
 std::string GetClosingText(int n, const std::vector<std::string>& args = {}) {
   if (n < 1 || n > static_cast<int>(kClosingTexts.size())) return std::string();
   const ClosingText& t = kClosingTexts[n - 1];
-  const std::string text = (tClosingLangID == kLangEstonian && *t.estonian) ? t.estonian : t.english;
-  std::string out;
-  size_t next = 0, start = 0;
-  for (size_t at = text.find("%s"); at != std::string::npos; at = text.find("%s", start)) {
-    out += text.substr(start, at - start);
-    if (next < args.size()) out += args[next++];
-    start = at + 2;
-  }
-  out += text.substr(start);
-  while (next < args.size()) out += args[next++];
-  return out;
+  return FillPlaceholders((tClosingLangID == kLangEstonian && *t.estonian) ? t.estonian : t.english, args);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -120,15 +111,14 @@ void Notify(int32_t kind, const Variant& value = Variant()) {
 
 // A date or a stored setting as a whole number of days; Empty and Null count as day 0.
 double WholeDays(const Variant& v) {
-  if (v.IsEmpty() || v.IsNull()) return 0;
-  return std::floor(CDate(v).serial);
+  return std::floor(ValueOr(v, Date()).serial);
 }
 
 int32_t CountOf(const Ref<XALServer>& server, const std::string& sql) {
   Ref<DataObject> rs = server->OpenQuery(sql, 4, "", "");
   if (rs->IsEOF()) return 0;
   const Variant c = rs->Field("C");
-  return (c.IsEmpty() || c.IsNull()) ? 0 : CLng(c);
+  return ValueOr(c, 0);
 }
 
 // Runs `body` in a transaction of the connection when the host offers one: a closing that fails

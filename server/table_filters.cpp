@@ -23,8 +23,6 @@ using internal::Require;
 constexpr int32_t kPropRowRights = 8;
 constexpr int32_t kPropRowRightsAlt = 50;
 
-bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
-
 // The catalogue flag `name` of object type `entry`; an object type the catalogue does not list
 // has no flags.
 bool CatalogueFlag(const Ref<ParamList>& entry, const char* name) { return entry && IsTrue(entry->Item(name)); }
