@@ -8,7 +8,6 @@
 #include <string_view>
 
 #include "runtime/convert.h"
-#include "runtime/text.h"
 
 namespace xal {
 
@@ -182,14 +181,23 @@ std::string GetUIString(int32_t number, std::span<const Variant> args) {
   if (!tTable.built) InitUIStrings();
   const std::string& text = TextFor(number);
   if (args.empty()) return text;
-  // k placeholders give k + 1 pieces; walk pieces and arguments side by side until both run out.
-  const std::vector<std::string> pieces = Split(text, "%s");
-  const size_t steps = std::max(pieces.size(), args.size());
+  // A Null argument adds nothing.
+  std::vector<std::string> texts;
+  texts.reserve(args.size());
+  for (const Variant& a : args) texts.push_back(a.IsNull() ? std::string() : CStr(a));
+  return FillPlaceholders(text, texts);
+}
+
+std::string FillPlaceholders(std::string_view text, std::span<const std::string> args) {
   std::string out;
-  for (size_t i = 0; i < steps; ++i) {
-    if (i < pieces.size()) out += pieces[i];
-    if (i < args.size() && !args[i].IsNull()) out += CStr(args[i]);
+  size_t next = 0, start = 0;
+  for (size_t at = text.find("%s"); at != std::string_view::npos; at = text.find("%s", start)) {
+    out += text.substr(start, at - start);
+    if (next < args.size()) out += args[next++];
+    start = at + 2;
   }
+  out += text.substr(start);
+  while (next < args.size()) out += args[next++];
   return out;
 }
 

@@ -8,6 +8,7 @@
 #include <initializer_list>
 #include <span>
 #include <string>
+#include <string_view>
 
 #include "runtime/variant.h"
 
@@ -33,6 +34,11 @@ std::string GetUIString(int32_t number, std::span<const Variant> args);
 inline std::string GetUIString(int32_t number, std::initializer_list<Variant> args = {}) {
   return GetUIString(number, std::span<const Variant>(args.begin(), args.size()));
 }
+
+// `text` with each "%s" replaced, in order, by the next argument: an argument without a
+// placeholder is appended at the end, a placeholder without an argument is dropped. Every
+// message table of the component (these texts, the period-closing texts) fills its texts so.
+std::string FillPlaceholders(std::string_view text, std::span<const std::string> args);
 
 // Whether this thread has built its table yet (it is built on the first valid look-up).
 bool UIStringTableBuilt();

@@ -6,6 +6,7 @@
 #include <atomic>
 
 #include "host/data_object.h"
+#include "host/filter_layer.h"
 #include "host/host_error.h"
 #include "host/inventory.h"
 #include "host/kept_balances.h"
@@ -273,7 +274,7 @@ const LinkedRow* HostConnection::LinkedRecord(const std::string& table, int32_t 
   key += std::to_string(id);
   auto it = linkCache_.find(key);
   if (it != linkCache_.end()) return it->second.get();
-  ResultSet rs = db_->Query("SELECT * FROM \"" + table + "\" WHERE ID = ?", {Variant(id)});
+  ResultSet rs = db_->Query("SELECT * FROM " + QuoteName(table) + " WHERE ID = ?", {Variant(id)});
   std::unique_ptr<LinkedRow> row;
   if (!rs.rows.empty()) {
     row = std::make_unique<LinkedRow>();
@@ -292,36 +293,9 @@ Ref<HostConnection> HostServer::conn() const {
   return c;
 }
 
-namespace {
-bool IsPlainName(const std::string& s) {
-  if (s.empty()) return false;
-  for (char ch : s)
-    if (!(std::isalnum(static_cast<unsigned char>(ch)) || ch == '_')) return false;
-  return true;
-}
-}  // namespace
-
-// The host's filter layer: what a form's filter may hold besides a plain condition on its table.
-//   {condition}             braces mark raw SQL for the host: the condition inside is used as it is
-//   Rel.Column op value     one condition on a relation table that names the filtered table's rows
-//                           (a column "ID" + table), as "GRArticleCatRel.IDGRArticleCat = 3" on
-//                           GRArticle: ID IN (SELECT IDGRArticle FROM GRArticleCatRel WHERE …)
+// The form filter as a condition on `table` (host/filter_layer.h).
 std::string HostServer::FilterCondition(const std::string& table, const std::string& filter) {
-  std::string f = Trim(filter);
-  if (f.size() >= 2 && f.front() == '{' && f.back() == '}') return Trim(f.substr(1, f.size() - 2));
-  const size_t dot = f.find('.');
-  if (dot == std::string::npos || !IsPlainName(f.substr(0, dot))) return f;
-  const std::string rel = f.substr(0, dot);
-  if (TextEquals(rel, table)) return f;
-  size_t end = dot + 1;
-  while (end < f.size() && (std::isalnum(static_cast<unsigned char>(f[end])) || f[end] == '_')) ++end;
-  const std::string rest = f.substr(dot + 1);
-  if (end == dot + 1 || rest.find('.') != std::string::npos) return f;
-  Ref<HostConnection> c = conn();
-  const std::string key = "ID" + table;
-  for (const std::string& col : c->db().TableColumns(rel))
-    if (TextEquals(col, key)) return "ID IN (SELECT " + key + " FROM " + rel + " WHERE " + rest + ")";
-  return f;
+  return FormFilterCondition(*conn(), table, filter);
 }
 
 Ref<DataObject> HostServer::OpenQuery(const std::string& sqlOrTable, int32_t, const std::string& filter,
@@ -344,7 +318,7 @@ Ref<DataObject> HostServer::OpenQuery(const std::string& sqlOrTable, int32_t, co
 Ref<DataObject> HostServer::OpenDataObject(const std::string& table) {
   Ref<HostConnection> c = conn();
   if (!IsPlainName(table)) Raise(kErrInvalidCall, "Not a table name: " + table);
-  return c->OpenRows("SELECT * FROM \"" + table + "\"", table, c->BaseTable(table));
+  return c->OpenRows("SELECT * FROM " + QuoteName(table), table, c->BaseTable(table));
 }
 
 Ref<ParamList> HostServer::NewParamList() { return MakeRef<HostParamList>(); }

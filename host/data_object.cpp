@@ -48,12 +48,6 @@ Variant Coerce(const Variant& v, ColumnKind kind) {
   return v;
 }
 
-std::string Quoted(const std::string& name) {
-  std::string q = "\"";
-  for (char c : name) q += (c == '"') ? std::string("\"\"") : std::string(1, c);
-  return q + "\"";
-}
-
 }  // namespace
 
 void RegisterDataObjectFunction(const std::string& name, DataObjectFunction fn) {
@@ -178,7 +172,7 @@ void HostDataObject::GoToBookmark(const Variant& bookmark) {
 // writes ("ID=5", "Code='A' AND Qty>0") means what it means in a query.
 int32_t HostDataObject::FindFirst(const std::string& condition, int32_t) {
   std::string select = "SELECT (" + conn_->Translate(condition) + ") FROM (SELECT ";
-  for (size_t i = 0; i < columns_.size(); ++i) select += (i ? ", ?" : "?") + std::to_string(i + 1) + " AS " + Quoted(columns_[i]);
+  for (size_t i = 0; i < columns_.size(); ++i) select += (i ? ", ?" : "?") + std::to_string(i + 1) + " AS " + QuoteName(columns_[i]);
   select += columns_.empty() ? "1)" : ")";
   sqlite3* db = conn_->db().handle();
   sqlite3_stmt* stmt = nullptr;
@@ -239,7 +233,7 @@ void HostDataObject::WriteRow(Row& row) {
   Database& db = conn_->db();
   const int id = ColumnIndex("ID");
   if (row.isDeleted) {
-    if (!row.isNew && id >= 0) db.Exec("DELETE FROM " + Quoted(writeTable_) + " WHERE ID = ?", {row.values[size_t(id)]});
+    if (!row.isNew && id >= 0) db.Exec("DELETE FROM " + QuoteName(writeTable_) + " WHERE ID = ?", {row.values[size_t(id)]});
   } else if (row.isNew) {
     std::vector<std::string> stored = db.TableColumns(writeTable_);
     std::string cols, marks;
@@ -251,17 +245,17 @@ void HostDataObject::WriteRow(Row& row) {
       if (TextEquals(c, "DocName") && (v.IsNull() || v == Variant("")) && !TextEquals(table_, writeTable_))
         v = Variant(table_);
       if (v.IsNull()) continue;
-      cols += (cols.empty() ? "" : ", ") + Quoted(c);
+      cols += (cols.empty() ? "" : ", ") + QuoteName(c);
       marks += marks.empty() ? "?" : ", ?";
       params.push_back(v);
     }
-    std::string sql = cols.empty() ? "INSERT INTO " + Quoted(writeTable_) + " DEFAULT VALUES"
-                                   : "INSERT INTO " + Quoted(writeTable_) + " (" + cols + ") VALUES (" + marks + ")";
+    std::string sql = cols.empty() ? "INSERT INTO " + QuoteName(writeTable_) + " DEFAULT VALUES"
+                                   : "INSERT INTO " + QuoteName(writeTable_) + " (" + cols + ") VALUES (" + marks + ")";
     db.Exec(sql, params);
     Variant newID = id >= 0 && !row.values[size_t(id)].IsNull() ? row.values[size_t(id)]
                                                                  : Variant(static_cast<int32_t>(db.LastInsertId()));
     // Read the stored row back so that defaults the table filled in are seen.
-    ResultSet back = db.Query("SELECT * FROM " + Quoted(writeTable_) + " WHERE ID = ?", {newID});
+    ResultSet back = db.Query("SELECT * FROM " + QuoteName(writeTable_) + " WHERE ID = ?", {newID});
     if (!back.rows.empty())
       for (size_t k = 0; k < back.columns.size(); ++k) {
         int i = ColumnIndex(back.columns[k]);
@@ -273,12 +267,12 @@ void HostDataObject::WriteRow(Row& row) {
     std::vector<Variant> params;
     for (size_t k = 0; k < columns_.size(); ++k)
       if (row.changed[k] && static_cast<int>(k) != id) {
-        sets += (sets.empty() ? "" : ", ") + Quoted(columns_[k]) + " = ?";
+        sets += (sets.empty() ? "" : ", ") + QuoteName(columns_[k]) + " = ?";
         params.push_back(row.values[k]);
       }
     if (!sets.empty()) {
       params.push_back(row.values[size_t(id)]);
-      db.Exec("UPDATE " + Quoted(writeTable_) + " SET " + sets + " WHERE ID = ?", params);
+      db.Exec("UPDATE " + QuoteName(writeTable_) + " SET " + sets + " WHERE ID = ?", params);
     }
   }
   row.changed.assign(columns_.size(), false);

@@ -8,6 +8,7 @@
 
 #include "host/host_error.h"
 #include "host/sql_functions.h"
+#include "runtime/ascii.h"
 #include "runtime/error.h"
 #include "runtime/text.h"
 
@@ -22,12 +23,6 @@ namespace {
 // keeps_balances(): the switch of the kept-balance triggers, one per connection.
 void KeepsBalancesFn(sqlite3_context* ctx, int, sqlite3_value**) {
   sqlite3_result_int(ctx, static_cast<const Database*>(sqlite3_user_data(ctx))->KeepsBalances() ? 1 : 0);
-}
-
-bool StartsWithNoCase(const char* s, const char* prefix) {
-  for (; *prefix; ++s, ++prefix)
-    if (!*s || std::toupper(static_cast<unsigned char>(*s)) != *prefix) return false;
-  return true;
 }
 }  // namespace
 
@@ -73,13 +68,13 @@ void Database::ClearStatements() {
 
 ColumnKind KindFromDeclType(const char* d) {
   if (!d) return ColumnKind::Auto;
-  if (StartsWithNoCase(d, "DATE")) return ColumnKind::Date;
-  if (StartsWithNoCase(d, "CURRENCY")) return ColumnKind::Currency;
-  if (StartsWithNoCase(d, "BOOL")) return ColumnKind::Boolean;
-  if (StartsWithNoCase(d, "INT")) return ColumnKind::Integer;
-  if (StartsWithNoCase(d, "REAL") || StartsWithNoCase(d, "DOUBLE") || StartsWithNoCase(d, "FLOAT"))
+  if (AsciiStartsWithNoCase(d, "DATE")) return ColumnKind::Date;
+  if (AsciiStartsWithNoCase(d, "CURRENCY")) return ColumnKind::Currency;
+  if (AsciiStartsWithNoCase(d, "BOOL")) return ColumnKind::Boolean;
+  if (AsciiStartsWithNoCase(d, "INT")) return ColumnKind::Integer;
+  if (AsciiStartsWithNoCase(d, "REAL") || AsciiStartsWithNoCase(d, "DOUBLE") || AsciiStartsWithNoCase(d, "FLOAT"))
     return ColumnKind::Real;
-  if (StartsWithNoCase(d, "TEXT") || StartsWithNoCase(d, "VARCHAR") || StartsWithNoCase(d, "CHAR"))
+  if (AsciiStartsWithNoCase(d, "TEXT") || AsciiStartsWithNoCase(d, "VARCHAR") || AsciiStartsWithNoCase(d, "CHAR"))
     return ColumnKind::Text;
   return ColumnKind::Auto;
 }

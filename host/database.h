@@ -10,6 +10,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "runtime/text.h"
 #include "runtime/variant.h"
 
 struct sqlite3;
@@ -65,6 +66,10 @@ class Database {
   std::string path_;
   bool keepsBalances_ = true;
 };
+
+// A name (table, column, alias) as an SQLite quoted identifier: between double quotes, each double
+// quote inside doubled, so that any name the host is handed stays one name in the SQL it builds.
+inline std::string QuoteName(std::string_view name) { return DoubleQuoted(name); }
 
 // Converts a Variant to what SQLite stores: dates as serial days, currency as REAL, Booleans as
 // -1/0, Empty and Null as NULL.

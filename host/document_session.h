@@ -1,37 +1,26 @@
 // The host's side of one document form: opens a document kind (new, or stored by id) with its
 // header and row data objects, creates and wires the document proxy, registers the form's data
-// objects, answers every proxy event — cached component rows under "Next" and reservation
-// sub-rows per row, settings, selected bookmarks, object look-ups, questions and input boxes by a
-// programmable policy — records each event in a transcript, and saves the document (header,
-// rows, sub-rows, and the header's date and state copied into store rows for the balances).
-// Ownership: the session owns the proxy, the data objects and the caches; the proxy's event sink
-// refers back to the session weakly; Close() destroys the proxy and breaks every cycle.
+// objects, puts a simulated user (host/simulated_user.h) in front of the form to answer the proxy's
+// events, keeps the cached component rows under "Next" and the reservation sub-rows per row, and
+// saves the document (header, rows, sub-rows, and the header's date and state copied into store
+// rows for the balances).
+// Ownership: the session owns the proxy, the data objects, the caches and the simulated user; the
+// user refers back to the session weakly; Close() destroys the proxy and breaks every cycle.
 #pragma once
 
-#include <deque>
-#include <functional>
 #include <map>
+#include <memory>
 #include <string>
 #include <vector>
 
 #include "bridge/proxy.h"
 #include "host/connection.h"
 #include "host/data_object.h"
+#include "host/simulated_user.h"
 
 namespace xal::host {
 
-// How the simulated user answers. Unset answers use the defaults given.
-struct AnswerPolicy {
-  std::deque<int32_t> msgBoxAnswers;          // taken in order; then `msgBoxDefault`
-  int32_t msgBoxDefault = 6;                   // Yes
-  std::function<bool(ParamList& params, const std::string& title)> inputBox;  // fills params; result
-  bool inputBoxDefault = false;                // Cancel
-  std::map<std::string, Variant> settings;     // folded key -> answer; missing keys answer the default
-  std::map<std::string, Variant> functions;    // InvokeFunc answers by folded name
-  std::vector<int32_t> selectedBookmarks;      // what GetSelBookmarks hands out
-};
-
-class DocumentSession : public Object {
+class DocumentSession : public Object, public UserForm {
  public:
   // Opens the document kind `docTable` ("SDInvoice"); `id` 0 starts a new document.
   static Ref<DocumentSession> Open(const Ref<HostConnection>& conn, const std::string& docTable, int32_t id = 0);
@@ -43,20 +32,19 @@ class DocumentSession : public Object {
   Ref<HostConnection> Connection() const { return conn_; }
   const std::string& DocTable() const { return docTable_; }
   const std::string& RowTable() const { return rowTable_; }
-  AnswerPolicy& Policy() { return policy_; }
+  // The simulated user at the form, its answers and its transcript of every event
+  // (`MsgBox("Save?",4)->6`, `StatusMsg("")`, `RefreshHeader("")`, …).
+  SimulatedUser& User() { return *user_; }
+  AnswerPolicy& Policy() { return user_->Policy(); }
+  const std::vector<std::string>& Transcript() const { return user_->Transcript(); }
+  std::string TranscriptText() const { return user_->TranscriptText(); }
+  void ClearTranscript() { user_->ClearTranscript(); }
 
-  // Every event as one line: `MsgBox("Save?",4)->6`, `StatusMsg("")`, `RefreshHeader("")`, …
-  const std::vector<std::string>& Transcript() const { return transcript_; }
-  std::string TranscriptText() const;  // the lines joined with "; "
-  void ClearTranscript() { transcript_.clear(); }
-
-  // Answers for scripts and `xal session`: the next MsgBox answer, a setting, a function's
-  // answer, and an input box that confirms (or not) after copying `values` (a ParamList or an
-  // array of name/value pairs) into the caller's list.
-  void AddMsgBoxAnswer(int32_t answer) { policy_.msgBoxAnswers.push_back(answer); }
-  void SetSettingAnswer(const std::string& key, const Variant& value);
-  void SetFunctionAnswer(const std::string& name, const Variant& value);
-  void SetInputBoxAnswer(bool confirm, const Variant& values);
+  // Answers for scripts and `xal session` (see SimulatedUser).
+  void AddMsgBoxAnswer(int32_t answer) { user_->AddMsgBoxAnswer(answer); }
+  void SetSettingAnswer(const std::string& key, const Variant& value) { user_->SetSettingAnswer(key, value); }
+  void SetFunctionAnswer(const std::string& name, const Variant& value) { user_->SetFunctionAnswer(name, value); }
+  void SetInputBoxAnswer(bool confirm, const Variant& values) { user_->SetInputBoxAnswer(confirm, values); }
 
   // The form's document logic, wired on first use (Create, the rows bound, Doc_Initialize).
   ObjectRef DocFunc();
@@ -71,11 +59,18 @@ class DocumentSession : public Object {
   Ref<HostDataObject> CachedRows(const std::string& table, const std::string& link, bool create);
   void ReleaseCachedRows(const std::string& table, const std::string& link);
 
+  // ---- UserForm: what the simulated user sees of the form ----------------------------------------
+  // "DocData" or the document table: the header; the row table or "Rows": the rows.
+  Ref<DataObject> FormObject(const std::string& name) override;
+  Ref<DataObject> FormCache(const std::string& table, const std::string& link, bool create) override {
+    return CachedRows(table, link, create);
+  }
+  void ReleaseFormCache(const std::string& table, const std::string& link) override {
+    ReleaseCachedRows(table, link);
+  }
+
  private:
-  class Sink;
-  friend class Sink;
   DocumentSession() = default;
-  void Record(std::string line) { transcript_.push_back(std::move(line)); }
   Ref<HostDataObject> OpenSubRows(const std::string& link, const Variant& parentID);
   void SaveSubRows(const std::map<int32_t, int32_t>& serialToID);
   void ReleaseDocFunc();
@@ -85,9 +80,7 @@ class DocumentSession : public Object {
   Ref<XALSBEproxy> proxy_;
   ObjectRef docFunc_;
   Ref<HostDataObject> header_, rows_, savedHeader_;
-  std::shared_ptr<Sink> sink_;
-  AnswerPolicy policy_;
-  std::vector<std::string> transcript_;
+  std::shared_ptr<SimulatedUser> user_;
   // Sub-rows by (folded link, parent row bookmark).
   std::map<std::pair<std::string, int32_t>, Ref<HostDataObject>> caches_;
 };

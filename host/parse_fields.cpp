@@ -136,8 +136,7 @@ Variant ParseFields(HostDataObject& self, const Variant& params, int32_t) {
   if (!list) Raise(kErrInvalidCall, "ParseFields needs a parameter list");
   std::string condition, alias;
   SplitAliasSuffix(CStr(list->Item("SelectQuery")), condition, alias);
-  const Variant leftJoin = list->Item("LeftJoin");
-  ConditionParser parser(self, alias, !leftJoin.IsEmpty() && !leftJoin.IsNull() && CBool(leftJoin));
+  ConditionParser parser(self, alias, IsTrue(list->Item("LeftJoin")));
   const std::string where = parser.Where(condition);
   list->Set("Where", Variant(where));
   list->Set("From", Variant(parser.From()));

@@ -76,7 +76,8 @@ Variant HostDataObject::RecordOperation(int32_t code, const Variant& arg) {
   const std::string table = conn_->BaseTable(TableName());
   int64_t moved = 0;
   for (const auto& [t, col] : ReferencesTo(db, table))
-    moved += db.Exec("UPDATE \"" + t + "\" SET \"" + col + "\" = ? WHERE \"" + col + "\" = ?", {Variant(target), source});
+    moved += db.Exec("UPDATE " + QuoteName(t) + " SET " + QuoteName(col) + " = ? WHERE " + QuoteName(col) + " = ?",
+                     {Variant(target), source});
   conn_->InvalidateLinks();
   return Variant(static_cast<int32_t>(moved));
 }

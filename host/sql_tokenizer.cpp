@@ -17,6 +17,8 @@
 // name-start is a letter, "_" or a byte >= 0x80 (UTF-8); name-char adds digits and "$".
 #include "host/sql_tokenizer.h"
 
+#include "runtime/ascii.h"
+
 namespace xal::host {
 namespace {
 
@@ -25,7 +27,6 @@ bool IsAlpha(char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); 
 bool IsNameStart(char c) { return IsAlpha(c) || c == '_' || static_cast<unsigned char>(c) >= 0x80; }
 bool IsNameChar(char c) { return IsNameStart(c) || IsDigit(c) || c == '$'; }
 bool IsSpace(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\f' || c == '\v'; }
-char Lower(char c) { return (c >= 'A' && c <= 'Z') ? char(c - 'A' + 'a') : c; }
 
 class Scanner {
  public:
@@ -91,8 +92,7 @@ class Scanner {
     while (IsSpace(At(k))) ++k;
     size_t w = k;
     while (IsAlpha(At(w))) ++w;
-    std::string word;
-    for (size_t x = k; x < w; ++x) word += Lower(s_[x]);
+    const std::string word = AsciiLower(s_.substr(k, w - k));
     if (word == "fn" && IsSpace(At(w))) {
       *kind = SqlTokenKind::kOdbcFn;
       return w + 1 - i_;
@@ -235,10 +235,7 @@ std::string SqlTokenValue(const SqlToken& token) {
 }
 
 bool IsSqlWord(const SqlToken& token, std::string_view word) {
-  if (token.kind != SqlTokenKind::kIdentifier || token.text.size() != word.size()) return false;
-  for (size_t k = 0; k < word.size(); ++k)
-    if (Lower(token.text[k]) != Lower(word[k])) return false;
-  return true;
+  return token.kind == SqlTokenKind::kIdentifier && AsciiEqualsNoCase(token.text, word);
 }
 
 }  // namespace xal::host

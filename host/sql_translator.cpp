@@ -25,8 +25,10 @@
 #include <string>
 #include <vector>
 
+#include "host/database.h"
 #include "host/host_error.h"
 #include "host/sql_tokenizer.h"
+#include "runtime/ascii.h"
 #include "runtime/dates.h"
 #include "runtime/error.h"
 
@@ -42,26 +44,6 @@ bool IsNameChar(char c) {
          c == '$' || static_cast<unsigned char>(c) >= 0x80;
 }
 bool IsDigit(char c) { return c >= '0' && c <= '9'; }
-
-bool EqualsNoCase(std::string_view a, std::string_view b) {
-  if (a.size() != b.size()) return false;
-  for (size_t k = 0; k < a.size(); ++k) {
-    char x = a[k], y = b[k];
-    if (x >= 'A' && x <= 'Z') x = char(x - 'A' + 'a');
-    if (y >= 'A' && y <= 'Z') y = char(y - 'A' + 'a');
-    if (x != y) return false;
-  }
-  return true;
-}
-
-std::string QuoteName(std::string_view name) {
-  std::string q = "\"";
-  for (char c : name) {
-    q += c;
-    if (c == '"') q += '"';
-  }
-  return q + "\"";
-}
 
 // A name SQLite reads without quotes: a letter or "_" first, name characters after.
 std::string NameText(std::string_view name) {
@@ -511,10 +493,34 @@ class Statement {
   bool RewriteUpdate(Emitter& e) {
     int set = FindWord(1, N(), "SET");
     if (set < 0) return false;
-    struct Item {
-      int first, last, on = -1;
-    };
-    std::vector<Item> items{{1, set - 1}};
+    const std::vector<ListEntry> items = UpdateTableList(set);
+    const UpdateTarget target = TargetOf(items[0]);
+    const std::string owner = NameValue(target.alias >= 0 ? target.alias : target.nameLast);
+
+    // SET assignments up to WHERE: qualified targets must belong to the target table.
+    int where = FindWord(set + 1, N(), "WHERE");
+    int setEnd = where >= 0 ? where : N();
+    if (FindWord(set + 1, setEnd, "FROM") >= 0 && items.size() > 1)
+      Refuse("UPDATE: a joined table list together with a FROM clause");
+    const bool qualified = UnqualifySetTargets(set, setEnd, owner);
+    if (items.size() == 1 && target.alias < 0 && !qualified) return false;
+    if (where == N() - 1) Refuse("UPDATE: WHERE without a condition");
+    EmitUpdate(e, items, target, set, setEnd, where);
+    return true;
+  }
+
+  // One entry of UPDATE's table list: significant positions first..last, its ON (or -1).
+  struct ListEntry {
+    int first, last, on = -1;
+  };
+  // The target entry: the table name ends at nameLast; alias is its alias's position or -1.
+  struct UpdateTarget {
+    int first, nameLast, alias;
+  };
+
+  // The table list before SET, cut at "," and [INNER|CROSS] JOIN, with each entry's ON noted.
+  std::vector<ListEntry> UpdateTableList(int set) {
+    std::vector<ListEntry> items{{1, set - 1}};
     for (int p = 1; p < set; p = Step(p)) {
       int sep = 0;  // tokens in the separator
       if (KindAt(p) == K::kComma) {
@@ -538,33 +544,34 @@ class Statement {
         p += sep - 1;
       }
     }
-    for (const Item& it : items) {
+    for (const ListEntry& it : items) {
       int end = it.on >= 0 ? it.on - 1 : it.last;
       if (it.first > end || (it.on >= 0 && it.on == it.last)) Refuse("UPDATE: an empty entry in the table list");
     }
+    return items;
+  }
 
-    // The target: name[.name] [AS] [alias].
-    const Item& target = items[0];
-    int p = target.first;
-    if (target.on >= 0 || !IsName(p)) Refuse("UPDATE: the target must be a table name with an optional alias");
+  // The target entry: name[.name] [AS] [alias].
+  UpdateTarget TargetOf(const ListEntry& entry) {
+    int p = entry.first;
+    if (entry.on >= 0 || !IsName(p)) Refuse("UPDATE: the target must be a table name with an optional alias");
     int nameLast = p;
-    if (KindAt(p + 1) == K::kDot && p + 2 <= target.last && IsName(p + 2)) nameLast = p + 2;
+    if (KindAt(p + 1) == K::kDot && p + 2 <= entry.last && IsName(p + 2)) nameLast = p + 2;
     int alias = -1;
     int q = nameLast + 1;
     if (Is(q, "AS")) ++q;
-    if (q <= target.last) {
-      if (q != target.last || !IsName(q)) Refuse("UPDATE: the target must be a table name with an optional alias");
+    if (q <= entry.last) {
+      if (q != entry.last || !IsName(q)) Refuse("UPDATE: the target must be a table name with an optional alias");
       alias = q;
     } else if (q != nameLast + 1) {
       Refuse("UPDATE: AS without an alias");
     }
-    std::string owner = NameValue(alias >= 0 ? alias : nameLast);
+    return {entry.first, nameLast, alias};
+  }
 
-    // SET assignments up to WHERE: qualified targets must belong to the target table.
-    int where = FindWord(set + 1, N(), "WHERE");
-    int setEnd = where >= 0 ? where : N();
-    if (FindWord(set + 1, setEnd, "FROM") >= 0 && items.size() > 1)
-      Refuse("UPDATE: a joined table list together with a FROM clause");
+  // Drops the "owner." qualifier of each SET target between set and setEnd; a target qualified by
+  // another table is refused. Returns whether any target was qualified.
+  bool UnqualifySetTargets(int set, int setEnd, const std::string& owner) {
     bool qualified = false;
     for (int a = set + 1; a < setEnd;) {
       int b = a;
@@ -572,7 +579,7 @@ class Statement {
       if (KindAt(a + 1) == K::kDot) {
         if (!IsName(a) || !IsName(a + 2) || !IsText(a + 3, "="))
           Refuse("UPDATE: SET target " + TextOf(a, b - 1) + " is not a column of the target");
-        if (!EqualsNoCase(NameValue(a), owner))
+        if (!AsciiEqualsNoCase(NameValue(a), owner))
           Refuse("UPDATE: SET target " + TextOf(a, a + 2) + " belongs to another table");
         At(a).out.clear();  // a qualifier before its "." and column never joins two tokens
         At(a + 1).out.clear();
@@ -580,15 +587,18 @@ class Statement {
       }
       a = b + 1;
     }
-    if (items.size() == 1 && alias < 0 && !qualified) return false;
-    if (where == N() - 1) Refuse("UPDATE: WHERE without a condition");
+    return qualified;
+  }
 
+  // UPDATE target [AS alias] SET … [FROM the other entries] [WHERE (ON conditions) AND (where)].
+  void EmitUpdate(Emitter& e, const std::vector<ListEntry>& items, const UpdateTarget& target, int set, int setEnd,
+                  int where) {
     EmitTokens(e, begin_, sig_[0]);
     e.Append("UPDATE ");
-    EmitSig(e, target.first, nameLast);
-    if (alias >= 0) {
+    EmitSig(e, target.first, target.nameLast);
+    if (target.alias >= 0) {
       e.Append(" AS ");
-      EmitSig(e, alias, alias);
+      EmitSig(e, target.alias, target.alias);
     }
     e.Append(" ");
     EmitSig(e, set, setEnd - 1);
@@ -608,7 +618,6 @@ class Statement {
       if (wrap) e.Append(")");
     }
     EmitTokens(e, sig_[N() - 1] + 1, end_);
-    return true;
   }
 
   std::string TextOf(int first, int last) {
@@ -634,7 +643,7 @@ class Statement {
   // A name that already carries the prefix keeps it.
   std::string IndexName(int table, int index) {
     std::string prefix = NameValue(table) + "_", name = NameValue(index);
-    return NameText(EqualsNoCase(std::string_view(name).substr(0, prefix.size()), prefix) ? name : prefix + name);
+    return NameText(AsciiStartsWithNoCase(name, prefix) ? name : prefix + name);
   }
 
   void Drop() {

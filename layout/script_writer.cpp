@@ -45,17 +45,7 @@ void ScriptWriter::Quoted(std::string_view prefix, std::string_view text) {
   if (!text.empty()) Line({prefix, QuoteText(text)});
 }
 
-std::string ScriptWriter::QuoteText(std::string_view text) {
-  std::string out;
-  out.reserve(text.size() + 2);
-  out += '"';
-  for (char ch : text) {
-    out += ch;
-    if (ch == '"') out += '"';
-  }
-  out += '"';
-  return out;
-}
+std::string ScriptWriter::QuoteText(std::string_view text) { return DoubleQuoted(text); }
 
 std::string ScriptWriter::Decimal(int64_t value) {
   char buf[24];

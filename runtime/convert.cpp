@@ -10,6 +10,7 @@
 #include <cstring>
 #include <limits>
 
+#include "runtime/ascii.h"
 #include "runtime/dates.h"
 #include "runtime/locale.h"
 
@@ -568,21 +569,6 @@ Date CDate(const Variant& v) {
     default: return CheckedDate(CDbl(v));
   }
 }
-
-namespace {
-
-bool AsciiEqualsNoCase(std::string_view a, std::string_view b) {
-  if (a.size() != b.size()) return false;
-  for (size_t i = 0; i < a.size(); ++i) {
-    char x = a[i], y = b[i];
-    if (x >= 'A' && x <= 'Z') x = static_cast<char>(x - 'A' + 'a');
-    if (y >= 'A' && y <= 'Z') y = static_cast<char>(y - 'A' + 'a');
-    if (x != y) return false;
-  }
-  return true;
-}
-
-}  // namespace
 
 bool CBool(const Variant& v) {
   if (v.Type() != VarType::String) {

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <type_traits>
 
 #include "runtime/variant.h"
 
@@ -19,6 +20,25 @@ int16_t CInt(const Variant& v);      // half-even; error 6 outside the 16-bit ra
 Currency CCur(const Variant& v);     // half-even at the fourth decimal
 Date CDate(const Variant& v);        // numbers are serials; text is parsed as a date
 bool CBool(const Variant& v);        // numbers: non-zero; text "True"/"False" or numeric text
+
+// ---- Values the host hands over ------------------------------------------------------------------
+// A field of no row, a Null column and an unset option read as "no value"; the rules that read
+// them want a default instead of error 94 (Null) or a silent 0 (Empty).
+// `v` through the coercion for the fallback's type (CDbl, CLng, CCur, CDate, CStr, CBool), or
+// `fallback` itself when `v` is Empty or Null. Other values convert with that coercion's errors.
+template <class T>
+T ValueOr(const Variant& v, T fallback) {
+  if (v.IsEmpty() || v.IsNull()) return fallback;
+  if constexpr (std::is_same_v<T, double>) return CDbl(v);
+  else if constexpr (std::is_same_v<T, int32_t>) return CLng(v);
+  else if constexpr (std::is_same_v<T, Currency>) return CCur(v);
+  else if constexpr (std::is_same_v<T, Date>) return CDate(v);
+  else if constexpr (std::is_same_v<T, std::string>) return CStr(v);
+  else if constexpr (std::is_same_v<T, bool>) return CBool(v);
+  else static_assert(sizeof(T) == 0, "ValueOr: no coercion for this type");
+}
+// A value the host means as True: neither Empty nor Null, and CBool True (non-zero).
+inline bool IsTrue(const Variant& v) { return ValueOr(v, false); }
 
 // Int = floor, Fix = toward zero; both keep the type of their argument (Double stays Double,
 // Currency stays Currency, Date stays Date); Null gives Null; numeric text becomes Double.

@@ -9,6 +9,7 @@
 #include <cstdio>
 #include <ctime>
 
+#include "runtime/ascii.h"
 #include "runtime/error.h"
 #include "runtime/locale.h"
 
@@ -121,14 +122,6 @@ int64_t Timeline(Date d) {
   return dt.day * kSecondsPerDay + dt.secs;
 }
 
-char AsciiLower(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
-
-std::string LowerAscii(std::string_view s) {
-  std::string out(s);
-  for (char& c : out) c = AsciiLower(c);
-  return out;
-}
-
 }  // namespace
 
 // ---------------------------------------------------------------------------------------------
@@ -199,7 +192,7 @@ namespace {
 enum class Unit { Year, Quarter, Month, Day, Week, WeekOfYear, Hour, Minute, Second };
 
 Unit ParseInterval(std::string_view interval) {
-  std::string i = LowerAscii(interval);
+  std::string i = AsciiLower(interval);
   if (i == "yyyy") return Unit::Year;
   if (i == "q") return Unit::Quarter;
   if (i == "m") return Unit::Month;
@@ -384,7 +377,7 @@ class DateScanner {
     return v;
   }
   bool EatWord(std::string_view w) {
-    if (s_.size() - i_ < w.size() || LowerAscii(s_.substr(i_, w.size())) != w) return false;
+    if (s_.size() - i_ < w.size() || AsciiLower(s_.substr(i_, w.size())) != w) return false;
     i_ += w.size();
     return true;
   }

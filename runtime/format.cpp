@@ -8,6 +8,7 @@
 #include <cmath>
 #include <vector>
 
+#include "runtime/ascii.h"
 #include "runtime/convert.h"
 #include "runtime/dates.h"
 #include "runtime/locale.h"
@@ -15,19 +16,6 @@
 namespace xal {
 
 namespace {
-
-bool AsciiEqualsNoCase(std::string_view a, std::string_view b) {
-  if (a.size() != b.size()) return false;
-  for (size_t i = 0; i < a.size(); ++i) {
-    char x = a[i], y = b[i];
-    if (x >= 'A' && x <= 'Z') x = static_cast<char>(x + 32);
-    if (y >= 'A' && y <= 'Z') y = static_cast<char>(y + 32);
-    if (x != y) return false;
-  }
-  return true;
-}
-
-char Lower(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
 
 // Up to four sections: positive;negative;zero;null. Further ";" stay in the last one.
 struct Sections {
@@ -317,7 +305,7 @@ constexpr const char* kMonthNames[] = {"January", "February", "March",     "Apri
 constexpr const char* kDayNames[] = {"Sunday", "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday"};
 
 bool IsDateLetter(char c) {
-  c = Lower(c);
+  c = AsciiLower(c);
   return c == 'd' || c == 'm' || c == 'y' || c == 'h' || c == 'n' || c == 's' || c == 'w' || c == 'q';
 }
 
@@ -411,7 +399,7 @@ bool TakeAmPm(std::string_view s, size_t& i, const DateContext& c, std::string& 
 bool MinuteContext(std::string_view s, size_t i, size_t run, char prevLetter) {
   if (prevLetter == 'h') return true;
   for (size_t j = i + run; j < s.size(); ++j) {
-    char c = Lower(s[j]);
+    char c = AsciiLower(s[j]);
     if (IsDateLetter(c)) return c == 's';
     if (c == '"' || c == '\\') return false;
   }
@@ -420,7 +408,7 @@ bool MinuteContext(std::string_view s, size_t i, size_t run, char prevLetter) {
 
 bool HasAmPm(std::string_view s) {
   std::string lower;
-  for (char c : s) lower += Lower(c);
+  for (char c : s) lower += AsciiLower(c);
   return lower.find("am/pm") != std::string::npos || lower.find("a/p") != std::string::npos;
 }
 
@@ -430,14 +418,14 @@ std::string FormatDatePattern(Date date, std::string_view s) {
   char prev = 0;
   for (size_t i = 0; i < s.size();) {
     if (TakeLiteral(s, i, out) || TakeAmPm(s, i, c, out)) continue;
-    char letter = Lower(s[i]);
+    char letter = AsciiLower(s[i]);
     if (!IsDateLetter(letter)) {
       out += s[i] == '/' ? DateSeparator() : s[i];
       ++i;
       continue;
     }
     size_t run = 1;
-    while (i + run < s.size() && Lower(s[i + run]) == letter) ++run;
+    while (i + run < s.size() && AsciiLower(s[i + run]) == letter) ++run;
     out += DateToken(letter, run, letter == 'm' && MinuteContext(s, i, run, prev), c);
     prev = letter;
     i += run;

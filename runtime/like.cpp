@@ -6,6 +6,7 @@
 
 #include <unordered_map>
 
+#include "runtime/ascii.h"
 #include "runtime/error.h"
 #include "runtime/text.h"
 
@@ -43,7 +44,7 @@ struct Pattern {
 };
 
 char32_t Fold(char32_t c) {
-  if (c < 0x80) return (c >= 'A' && c <= 'Z') ? c + 32 : c;
+  if (c < 0x80) return static_cast<char32_t>(AsciiLower(static_cast<char>(c)));
   return static_cast<char32_t>(u_foldCase(static_cast<UChar32>(c), U_FOLD_CASE_DEFAULT));
 }
 

@@ -3,19 +3,12 @@
 
 #include <algorithm>
 
+#include "runtime/ascii.h"
 #include "runtime/error.h"
 
 namespace xal {
 
-namespace {
 // Member and class names are ASCII, so lowering ASCII letters is the whole case rule for them.
-std::string AsciiLower(std::string_view s) {
-  std::string out(s);
-  for (char& c : out)
-    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
-  return out;
-}
-}  // namespace
 
 const char* MemberKindName(MemberKind k) {
   switch (k) {
@@ -55,10 +48,7 @@ const MemberInfo* ClassInfo::Find(std::string_view name, MemberKind kind) const 
   std::string lowered;
   std::string_view key;
   if (name.size() <= sizeof buf) {
-    for (size_t i = 0; i < name.size(); ++i) {
-      char c = name[i];
-      buf[i] = (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c;
-    }
+    for (size_t i = 0; i < name.size(); ++i) buf[i] = AsciiLower(name[i]);
     key = std::string_view(buf, name.size());
   } else {
     lowered = AsciiLower(name);

@@ -4,6 +4,7 @@
 // non-ASCII text and linguistic ordering go through ICU.
 #include "runtime/text.h"
 
+#include "runtime/ascii.h"
 #include "runtime/locale.h"
 
 #include <unicode/uchar.h>
@@ -100,9 +101,6 @@ void AppendUtf8(std::string& out, char32_t c) {
   U8_APPEND_UNSAFE(buf, len, c);
   out.append(buf, static_cast<size_t>(len));
 }
-
-char AsciiLower(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c + 32) : c; }
-char AsciiUpper(char c) { return (c >= 'a' && c <= 'z') ? static_cast<char>(c - 32) : c; }
 
 char32_t FoldChar(UChar32 c) {
   if (c < 0) return kReplacement;
@@ -391,7 +389,7 @@ std::string Join(const SafeArray& parts, std::string_view delimiter) {
 }
 
 // ---------------------------------------------------------------------------------------------
-// Trimming, padding, case
+// Trimming, padding, case, quoting
 // ---------------------------------------------------------------------------------------------
 
 std::string LTrim(std::string_view s) {
@@ -425,6 +423,18 @@ std::string String(int32_t n, std::string_view ch) {
   std::string out;
   out.reserve(one.size() * static_cast<size_t>(n));
   for (int32_t i = 0; i < n; ++i) out.append(one);
+  return out;
+}
+
+std::string DoubleQuoted(std::string_view s) {
+  std::string out;
+  out.reserve(s.size() + 2);
+  out += '"';
+  for (char ch : s) {
+    out += ch;
+    if (ch == '"') out += '"';
+  }
+  out += '"';
   return out;
 }
 

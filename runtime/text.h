@@ -52,6 +52,10 @@ std::string Trim(std::string_view s);
 std::string LTrim(std::string_view s);
 std::string RTrim(std::string_view s);
 
+// The text between double quotes, each double quote inside doubled: the literal form of a string
+// in script text and of a quoted identifier in SQL.
+std::string DoubleQuoted(std::string_view s);
+
 std::string UCase(std::string_view s);  // one-to-one simple case mapping ("ß" stays "ß")
 std::string LCase(std::string_view s);
 std::string Space(int32_t n);           // error 5 for n < 0

@@ -16,6 +16,7 @@
 #include "runtime/trap.h"
 #include "server/internal/transaction.h"
 #include "server/internal/work_table.h"
+#include "server/sql_utils.h"
 #include "server/table_filters.h"
 
 namespace xal::server {
@@ -35,7 +36,6 @@ namespace {
 // How many work-table names a merge tries before it gives up.
 constexpr int kWorkTableTries = 20;
 
-std::string Num(int32_t v) { return std::to_string(v); }
 
 // Int(10000 × Rnd + 1) from a generator seeded once per thread, or the test's source.
 int32_t NextWorkTableNumber() {
@@ -69,12 +69,7 @@ struct Merge {
 
 // A field that may be absent from the table (not every register has a Code); empty then.
 std::string OptionalText(const Checked<DataObject>& obj, const char* field) {
-  return TryOr(
-      [&] {
-        const Variant v = obj->Field(field);
-        return (v.IsEmpty() || v.IsNull()) ? std::string() : CStr(v);
-      },
-      std::string());
+  return TryOr([&] { return ValueOr(obj->Field(field), std::string()); }, std::string());
 }
 
 // Units, quantity types and category groups are codes, and codes compare without regard to case
@@ -216,8 +211,6 @@ std::string RunMerge(const Merge& m) {
   if (isArticle || isStore) RefreshCurrentBalances(m);
   return std::string();
 }
-
-bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
 
 }  // namespace
 

@@ -7,7 +7,7 @@
 #include <utility>
 
 #include "runtime/operators.h"
-#include "server/sql_utils.h"
+#include "server/array_sort.h"
 
 namespace xal::server {
 

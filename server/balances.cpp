@@ -21,9 +21,6 @@ namespace {
 // The calendar day of a date: the serial without its time of day (toward zero, as dates split).
 double WholeDays(Date d) { return std::trunc(d.serial); }
 
-// A value the host means as True: not Empty, not Null, and non-zero.
-bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
-
 // Asks the data object of `view` for the balance of the record `id` named by `keyField` on `date`;
 // 0 when the host answers that it has none.
 Currency ViewBalance(const Ref<XALConnect>& conn, const char* view, const char* keyField, int32_t id, Date date) {

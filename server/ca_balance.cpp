@@ -50,8 +50,8 @@ int MonthIndex(Date d) {
 // Whole days of a date (its time of day dropped).
 double WholeDays(Date d) { return CDbl(Fix(Variant(d))); }
 
-Currency Cur(const Variant& v) { return v.IsNull() || v.IsEmpty() ? Currency() : CCur(v); }
-double Dbl(const Variant& v) { return v.IsNull() || v.IsEmpty() ? 0.0 : CDbl(v); }
+Currency Cur(const Variant& v) { return ValueOr(v, Currency()); }
+double Dbl(const Variant& v) { return ValueOr(v, 0.0); }
 
 struct AccountingYear {
   double begin = 0, end = 0;  // whole days, both included

@@ -15,12 +15,11 @@ namespace {
 
 // A field value as text, Null and Empty as "" (as "&" joins them).
 std::string FieldText(const Checked<DataObject>& obj, const std::string& field) {
-  const Variant v = obj->Field(field);
-  return v.IsNull() ? std::string() : CStr(v);
+  return ValueOr(obj->Field(field), std::string());
 }
 
 // "field <> 0" as a condition: Null is not true, Empty is 0.
-bool NonZero(const Variant& v) { return !v.IsNull() && !v.IsEmpty() && CDbl(v) != 0; }
+bool NonZero(const Variant& v) { return ValueOr(v, 0.0) != 0; }
 
 // The value of the field that the "DXCode" setting names for the table, `defaultField` unless set.
 std::string CodeFieldValue(const Checked<DataObject>& obj, const std::string& table, const char* defaultField) {

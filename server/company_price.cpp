@@ -18,17 +18,9 @@ namespace xal::server {
 
 namespace {
 
-std::string Num(int32_t v) { return std::to_string(v); }
-
-// An identifier field; a missing row, Empty or Null counts as 0.
-int32_t IdField(const Checked<DataObject>& rs, const char* name) {
-  const Variant v = rs->Field(name);
-  return (v.IsEmpty() || v.IsNull()) ? 0 : CLng(v);
-}
-
 double DateField(const Checked<DataObject>& rs, const char* name) {
   const Variant v = rs->Field(name);
-  return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDate(v).serial;
+  return ValueOr(v, Date()).serial;
 }
 
 // What the company and the article bring to the search.
@@ -62,8 +54,7 @@ bool ValidPriceRow(const Checked<XALServer>& server, int32_t article, int32_t li
     const double begin = DateField(rs, "BeginDate");
     const double end = DateField(rs, "EndDate");
     if (begin <= date.serial && (end >= date.serial || Year(Date(end)) < 1900)) {
-      const Variant p = rs->Field("Price");
-      price = (p.IsEmpty() || p.IsNull()) ? Currency() : CCur(p);
+      price = ValueOr(rs->Field("Price"), Currency());
       return true;
     }
   }
@@ -85,8 +76,7 @@ Currency WithPriceCut(const Checked<XALServer>& server, Currency price, const Cu
           " AND A.IDGRCompanyPriceCat = " + Num(c.companyCat) + " AND A.IDGRPriceList = " + Num(list),
       kQueryReadOnly, "", "");
   if (rs->IsEOF()) return price;
-  const Variant cut = rs->Field("PriceCut");
-  const double pct = (cut.IsEmpty() || cut.IsNull()) ? 0.0 : CDbl(cut);
+  const double pct = ValueOr(rs->Field("PriceCut"), 0.0);
   return CCur(Round(Variant(price.ToDouble() * (1 + pct / 100)), 2));
 }
 

@@ -18,12 +18,6 @@ namespace xal::server {
 
 namespace {
 
-// A numeric field read from a query; a missing row or a Null counts as 0.
-double NumberField(const Checked<DataObject>& rs, const char* name) {
-  const Variant v = rs->Field(name);
-  return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDbl(v);
-}
-
 // The dated rate of `curID` on the day of `date`, when GRCurValue has one; the SQL spacing differs
 // between the two callers and is kept as each sends it.
 bool DatedRate(const Checked<XALServer>& server, const std::string& sql, double& rate) {
@@ -87,8 +81,7 @@ Currency Convert(const Ref<XALConnect>& pXALConnect, int32_t pCurID, Date pConvD
   if (cur->IsEOF()) return pAmount;
 
   double rate = NumberField(cur, "FixedRate");
-  const Variant triField = cur->Field("IsTriangulation");
-  const bool tri = !(triField.IsEmpty() || triField.IsNull()) && CBool(triField);
+  const bool tri = IsTrue(cur->Field("IsTriangulation"));
   // Unlike CurRate, a zero date is looked up like any other.
   if (NumberField(cur, "DivThreshold") != 0) {
     DatedRate(server,

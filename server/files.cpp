@@ -8,7 +8,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/trap.h"
-#include "server/sql_utils.h"
+#include "server/files.h"
 
 namespace xal::server {
 

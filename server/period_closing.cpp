@@ -10,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "collections/ui_strings.h"
 #include "runtime/convert.h"
 #include "runtime/text.h"
 #include "runtime/trap.h"
@@ -52,17 +53,7 @@ thread_local int32_t tClosingLangID = 0;
 std::string GetClosingText(int n, const std::vector<std::string>& args = {}) {
   if (n < 1 || n > static_cast<int>(kClosingTexts.size())) return std::string();
   const ClosingText& t = kClosingTexts[n - 1];
-  const std::string text = (tClosingLangID == kLangEstonian && *t.estonian) ? t.estonian : t.english;
-  std::string out;
-  size_t next = 0, start = 0;
-  for (size_t at = text.find("%s"); at != std::string::npos; at = text.find("%s", start)) {
-    out += text.substr(start, at - start);
-    if (next < args.size()) out += args[next++];
-    start = at + 2;
-  }
-  out += text.substr(start);
-  while (next < args.size()) out += args[next++];
-  return out;
+  return FillPlaceholders((tClosingLangID == kLangEstonian && *t.estonian) ? t.estonian : t.english, args);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -114,15 +105,14 @@ void Notify(int32_t kind, const Variant& value = Variant()) {
 
 // A date or a stored setting as a whole number of days; Empty and Null count as day 0.
 double WholeDays(const Variant& v) {
-  if (v.IsEmpty() || v.IsNull()) return 0;
-  return std::floor(CDate(v).serial);
+  return std::floor(ValueOr(v, Date()).serial);
 }
 
 int32_t CountOf(const Checked<XALServer>& server, const std::string& sql) {
   const Checked<DataObject> rs = server->OpenQuery(sql, kQueryForward, "", "");
   if (rs->IsEOF()) return 0;
   const Variant c = rs->Field("C");
-  return (c.IsEmpty() || c.IsNull()) ? 0 : CLng(c);
+  return ValueOr(c, 0);
 }
 
 struct Closing {

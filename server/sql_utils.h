@@ -1,7 +1,8 @@
 // Small stateless helpers the component uses to build SQL text and to handle names, codes and
 // numbers: date and number literals, quoted text literals, rounding through formatting, a search
 // that skips quoted text, a check digit, document-name mappings, code <-> id translation through
-// linked tables, a chunked delete, whole-file byte transfer and an in-place array sort.
+// linked tables and a chunked delete. (Whole-file transfer is in server/files.h, the array sort in
+// server/array_sort.h.)
 // Every SQL text the component builds takes its literals from SQLDate, SQLDouble and SQLText, so
 // no value reaches SQL unquoted.
 #pragma once
@@ -11,6 +12,8 @@
 #include <string_view>
 
 #include "bridge/host_model.h"
+#include "runtime/convert.h"
+#include "runtime/trap.h"
 #include "runtime/variant.h"
 
 namespace xal::server {
@@ -19,8 +22,14 @@ namespace xal::server {
 std::string SQLDate(const Variant& pInDate, bool pWithTime = false);
 // The number's text with its first comma made a point.
 std::string SQLDouble(const Variant& pNum);
+// A whole number as SQL text: its digits, "-" in front when negative.
+inline std::string Num(int32_t v) { return std::to_string(v); }
 // A text literal: the text between single quotes, each quote inside doubled.
 std::string SQLText(std::string_view text);
+// Fields of a query's current row read with a default: no row (Empty) and Null count as 0 — a
+// part of a union with no rows, a store that is not there. A Nothing data object is error 91.
+inline double NumberField(const Checked<DataObject>& rs, const char* name) { return ValueOr(rs->Field(name), 0.0); }
+inline int32_t IdField(const Checked<DataObject>& rs, const char* name) { return ValueOr(rs->Field(name), 0); }
 // Rounding through formatting; the result is a Variant holding text.
 Variant Round(const Variant& pInVal, int16_t pPos = 0);
 // Case-insensitive search of pString2 in pString1 that skips matches inside quotes.
@@ -36,8 +45,5 @@ std::string QueryCodeToID(const std::string& pField, const std::string& pConditi
 std::string QueryIDToCode(const std::string& pField, const std::string& pCondition, const std::string& pArgument,
                           const Ref<DataObject>& pSourceTableOB, const std::string& pQueryLinkTable);
 bool SQLDelete(const Ref<XALConnect>& pXALConnect, const std::string& pSQLString, int32_t pOptions = 0);
-bool Bin2File(const std::string& pFileName, const Variant& pBinData);
-Variant File2Bin(const std::string& pFileName);
-void ArraySort(Variant& pArray);
 
 }  // namespace xal::server

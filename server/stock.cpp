@@ -34,29 +34,15 @@ struct CostOptionCache {
 };
 thread_local CostOptionCache tCostOptions;
 
-std::string Num(int32_t v) { return std::to_string(v); }
-
-// A numeric field; a missing row, Empty or Null counts as 0 (a part of a union with no rows).
-double NumberField(const Checked<DataObject>& rs, const char* name) {
-  const Variant v = rs->Field(name);
-  return (v.IsEmpty() || v.IsNull()) ? 0.0 : CDbl(v);
-}
-
-// A row identifier; a store that is not there (Null) is the same as none (0).
-int32_t IdField(const Checked<DataObject>& rs, const char* name) {
-  const Variant v = rs->Field(name);
-  return (v.IsEmpty() || v.IsNull()) ? 0 : CLng(v);
-}
-
 bool FlagSetting(const Checked<XALConnect>& conn, const char* category, const char* name) {
   const Variant v = conn->Setting(category, name, Variant(false));
-  return !(v.IsEmpty() || v.IsNull()) && CBool(v);
+  return IsTrue(v);
 }
 
 // The date up to which store periods are closed; 0 when stores were never closed.
 Date DateFixedSetting(const Checked<XALConnect>& conn) {
   const Variant v = conn->Setting("DateFixed", "Store", Variant(int32_t{0}));
-  return (v.IsEmpty() || v.IsNull()) ? Date() : CDate(v);
+  return ValueOr(v, Date());
 }
 
 // The date as a whole number of days (its day, the time of day dropped).
@@ -388,8 +374,7 @@ Variant CountCost(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticle, int3
   if (!art->IsEOF()) {
     std::string type = pArticleType;
     if (TextEquals(type, "X")) {
-      const Variant t = art->Field("ArticleType");
-      type = (t.IsEmpty() || t.IsNull()) ? std::string() : CStr(t);
+      type = ValueOr(art->Field("ArticleType"), std::string());
     }
     if (TextEquals(type, "S")) {
       result = art->Field("Cost");

@@ -16,7 +16,6 @@ namespace xal::server {
 
 namespace {
 
-bool IsTrue(const Variant& v) { return !v.IsEmpty() && !v.IsNull() && CBool(v); }
 
 // The catalogue flag `name` of object type `entry`; an object type the catalogue does not list
 // has no flags.

@@ -92,7 +92,7 @@ std::string Pad(const std::string& s, size_t width) {
 
 std::string Fixed(const Variant& v, int decimals) {
   char buf[64];
-  std::snprintf(buf, sizeof buf, "%.*f", decimals, v.IsNull() || v.IsEmpty() ? 0.0 : CDbl(v));
+  std::snprintf(buf, sizeof buf, "%.*f", decimals, ValueOr(v, 0.0));
   return buf;
 }
 
@@ -121,6 +121,104 @@ void ServerCalls(std::ostream& out, const Ref<host::HostConnection>& conn, const
   }
 }
 
+void Companies(std::ostream& out, host::Database& db) {
+  host::ResultSet companies = db.Query(
+      "SELECT C.Code, C.Name, C.CreditLimit, Y.Code, T.Name, P.Name, C.IDGRTermPaymentP FROM GRCompany C "
+      "LEFT JOIN GRCurrency Y ON Y.ID = C.IDGRCurrency LEFT JOIN GRTermPayment T ON T.ID = C.IDGRTermPayment "
+      "LEFT JOIN GRTermPayment P ON P.ID = C.IDGRTermPaymentP ORDER BY C.ID");
+  out << "  Companies (" << companies.rows.size() << ")\n";
+  for (const auto& r : companies.rows) {
+    const bool supplier = CLng(r[6]) != 0;
+    out << "    " << Pad(r[0].AsString(), 10) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 5);
+    if (supplier)
+      out << "supplier, pays in " << r[5].AsString();
+    else if (!r[4].IsNull())
+      out << "customer, " << r[4].AsString() << ", credit limit " << Fixed(r[2], 2);
+    else
+      out << "the owner";
+    out << "\n";
+  }
+}
+
+void Articles(std::ostream& out, host::Database& db) {
+  host::ResultSet articles = db.Query(
+      "SELECT A.Code, A.Name, A.ArticleType, U.Code, T.TaxPercent, A.IsLot, A.IsSerial, "
+      "(SELECT count(*) FROM GRArtCompletion C JOIN GRArtCompletionRow R ON R.IDGRArtCompletion = C.ID "
+      "WHERE C.IDGRArticle = A.ID) FROM GRArticle A LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit "
+      "LEFT JOIN GRTax T ON T.ID = A.IDGRTax ORDER BY A.ID");
+  out << "  Articles (" << articles.rows.size() << ")\n";
+  for (const auto& r : articles.rows) {
+    const std::string type = r[2].AsString();
+    out << "    " << Pad(r[0].AsString(), 13) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 4)
+        << (type == "S" ? "service" : type == "P" ? "set of " + CStr(r[7]) + " components" : "goods") << ", VAT "
+        << Fixed(r[4], 0) << "%" << (CBool(r[5]) ? ", kept by lot" : "") << (CBool(r[6]) ? ", kept by serial" : "")
+        << "\n";
+  }
+}
+
+void Stock(std::ostream& out, host::Database& db) {
+  host::ResultSet stock = db.Query(
+      "SELECT S.Code, S.Name, A.Code, A.Name, B.Quantity, B.RQuantity, B.PQuantity, U.Code, B.Cost "
+      "FROM DCurBalanceStore B JOIN DRStore S ON S.ID = B.IDDRStore JOIN GRArticle A ON A.ID = B.IDGRArticle "
+      "LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit ORDER BY S.ID, A.Code");
+  out << "  Stock per store (current balances, at average cost)\n";
+  std::string store;
+  for (const auto& r : stock.rows) {
+    if (r[0].AsString() != store) {
+      store = r[0].AsString();
+      out << "    " << store << " - " << r[1].AsString() << "\n";
+    }
+    out << "      " << Pad(r[2].AsString(), 13) << Pad(r[3].AsString(), 30) << Fixed(r[4], 2) << " "
+        << r[7].AsString() << " at " << Fixed(r[8], 4);
+    if (CDbl(r[5]) != 0) out << ", reserved " << Fixed(Variant(-CDbl(r[5])), 2);
+    if (CDbl(r[6]) != 0) out << ", pre-reserved " << Fixed(r[6], 2);
+    out << "\n";
+  }
+}
+
+void Currencies(std::ostream& out, host::HostConnection& conn) {
+  host::ResultSet rates = conn.db().Query(
+      "SELECT C.Code, C.FixedRate, C.DivThreshold, C.IsTriangulation, V.ChangeDate, V.ConversionRate "
+      "FROM GRCurrency C "
+      "LEFT JOIN GRCurValue V ON V.IDGRCurrency = C.ID AND V.ChangeDate = (SELECT max(ChangeDate) FROM GRCurValue "
+      "WHERE IDGRCurrency = C.ID) ORDER BY C.ID");
+  out << "  Currencies (base " << CStr(conn.Setting("GRCurrency", "BaseCurrency", Variant(0)))
+      << ", stock closed before " << IsoDate(conn.Setting("DateFixed", "Store", Variant(0))) << ")\n";
+  for (const auto& r : rates.rows) {
+    out << "    " << Pad(r[0].AsString(), 5);
+    if (!r[4].IsNull())
+      out << "latest rate " << Fixed(r[5], 4) << " of " << IsoDate(r[4]);
+    else
+      out << "fixed rate " << CStr(r[1]);
+    out << (CBool(r[3]) ? " (triangulation)" : "") << "\n";
+  }
+}
+
+// The sales invoice with the most rows, opened as a document form opens it.
+void Invoice(std::ostream& out, const Ref<host::HostConnection>& conn) {
+  const Variant id = conn->db().Scalar(
+      "SELECT D.ID FROM SDInvoice D ORDER BY (SELECT count(*) FROM SDInvoiceRow R WHERE R.IDDoc = D.ID) DESC, D.ID "
+      "LIMIT 1");
+  if (id.IsNull()) return;
+  auto s = host::DocumentSession::Open(conn, "SDInvoice", CLng(id));
+  Ref<host::HostDataObject> h = s->Header();
+  out << "  Sales invoice " << CStr(h->Field("DocNo")) << " of " << IsoDate(h->Field("DocDate"))
+      << ", opened as a document\n";
+  out << "    customer " << CStr(h->Field("GRCompany.Name")) << ", " << CStr(h->Field("CompanyAddr")) << "\n";
+  out << "    terms " << CStr(h->Field("GRTermPayment.Name")) << ", due " << IsoDate(h->Field("PromptDate"))
+      << ", currency " << CStr(h->Field("GRCurrency.Code")) << "\n";
+  Ref<host::HostDataObject> rows = s->Rows();
+  for (rows->MoveFirst(); !rows->IsEOF(); rows->MoveNext())
+    out << "    " << Pad(CStr(rows->Field("GRArticle.Code")), 13) << Pad(CStr(rows->Field("Name")), 30)
+        << Fixed(rows->Field("Quantity"), 2) << " " << Pad(CStr(rows->Field("GRUnit.Code")), 3) << " x "
+        << Fixed(rows->Field("UnitPrice"), 2) << " = " << Fixed(rows->Field("Amount"), 2) << ", VAT "
+        << Fixed(rows->Field("GRTax.TaxPercent"), 0) << "% " << Fixed(rows->Field("TaxAmount"), 2) << "\n";
+  out << "    VAT " << Fixed(h->Field("TaxAmount"), 2) << ", total " << Fixed(h->Field("TotalAmount"), 2) << "\n";
+  ServerCalls(out, conn, h, rows);
+  s->Close();
+}
+
+// The demo database in $XAL_DEMO_DB (kept), or in a temporary file removed afterwards.
 void DemoDatabase(std::ostream& out) {
   const char* env = std::getenv("XAL_DEMO_DB");
   const bool keep = env && *env;
@@ -129,95 +227,12 @@ void DemoDatabase(std::ostream& out) {
                                    ("xal_demo_" + std::to_string(::getpid()) + ".db")).string();
   {
     Ref<host::HostConnection> conn = host::OpenDemoDatabase(path, 1);
-    host::Database& db = conn->db();
     out << "The demo database (" << path << ")\n";
-
-    host::ResultSet companies = db.Query(
-        "SELECT C.Code, C.Name, C.CreditLimit, Y.Code, T.Name, P.Name, C.IDGRTermPaymentP FROM GRCompany C "
-        "LEFT JOIN GRCurrency Y ON Y.ID = C.IDGRCurrency LEFT JOIN GRTermPayment T ON T.ID = C.IDGRTermPayment "
-        "LEFT JOIN GRTermPayment P ON P.ID = C.IDGRTermPaymentP ORDER BY C.ID");
-    out << "  Companies (" << companies.rows.size() << ")\n";
-    for (const auto& r : companies.rows) {
-      const bool supplier = CLng(r[6]) != 0;
-      out << "    " << Pad(r[0].AsString(), 10) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 5);
-      if (supplier)
-        out << "supplier, pays in " << r[5].AsString();
-      else if (!r[4].IsNull())
-        out << "customer, " << r[4].AsString() << ", credit limit " << Fixed(r[2], 2);
-      else
-        out << "the owner";
-      out << "\n";
-    }
-
-    host::ResultSet articles = db.Query(
-        "SELECT A.Code, A.Name, A.ArticleType, U.Code, T.TaxPercent, A.IsLot, A.IsSerial, "
-        "(SELECT count(*) FROM GRArtCompletion C JOIN GRArtCompletionRow R ON R.IDGRArtCompletion = C.ID "
-        "WHERE C.IDGRArticle = A.ID) FROM GRArticle A LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit "
-        "LEFT JOIN GRTax T ON T.ID = A.IDGRTax ORDER BY A.ID");
-    out << "  Articles (" << articles.rows.size() << ")\n";
-    for (const auto& r : articles.rows) {
-      const std::string type = r[2].AsString();
-      out << "    " << Pad(r[0].AsString(), 13) << Pad(r[1].AsString(), 30) << Pad(r[3].AsString(), 4)
-          << (type == "S" ? "service" : type == "P" ? "set of " + CStr(r[7]) + " components" : "goods") << ", VAT "
-          << Fixed(r[4], 0) << "%" << (CBool(r[5]) ? ", kept by lot" : "") << (CBool(r[6]) ? ", kept by serial" : "")
-          << "\n";
-    }
-
-    host::ResultSet stock = db.Query(
-        "SELECT S.Code, S.Name, A.Code, A.Name, B.Quantity, B.RQuantity, B.PQuantity, U.Code, B.Cost "
-        "FROM DCurBalanceStore B JOIN DRStore S ON S.ID = B.IDDRStore JOIN GRArticle A ON A.ID = B.IDGRArticle "
-        "LEFT JOIN GRUnit U ON U.ID = A.IDGRUnit ORDER BY S.ID, A.Code");
-    out << "  Stock per store (current balances, at average cost)\n";
-    std::string store;
-    for (const auto& r : stock.rows) {
-      if (r[0].AsString() != store) {
-        store = r[0].AsString();
-        out << "    " << store << " - " << r[1].AsString() << "\n";
-      }
-      out << "      " << Pad(r[2].AsString(), 13) << Pad(r[3].AsString(), 30) << Fixed(r[4], 2) << " "
-          << r[7].AsString() << " at " << Fixed(r[8], 4);
-      if (CDbl(r[5]) != 0) out << ", reserved " << Fixed(Variant(-CDbl(r[5])), 2);
-      if (CDbl(r[6]) != 0) out << ", pre-reserved " << Fixed(r[6], 2);
-      out << "\n";
-    }
-
-    host::ResultSet rates = db.Query(
-        "SELECT C.Code, C.FixedRate, C.DivThreshold, C.IsTriangulation, V.ChangeDate, V.ConversionRate "
-        "FROM GRCurrency C "
-        "LEFT JOIN GRCurValue V ON V.IDGRCurrency = C.ID AND V.ChangeDate = (SELECT max(ChangeDate) FROM GRCurValue "
-        "WHERE IDGRCurrency = C.ID) ORDER BY C.ID");
-    out << "  Currencies (base " << CStr(conn->Setting("GRCurrency", "BaseCurrency", Variant(0)))
-        << ", stock closed before " << IsoDate(conn->Setting("DateFixed", "Store", Variant(0))) << ")\n";
-    for (const auto& r : rates.rows) {
-      out << "    " << Pad(r[0].AsString(), 5);
-      if (!r[4].IsNull())
-        out << "latest rate " << Fixed(r[5], 4) << " of " << IsoDate(r[4]);
-      else
-        out << "fixed rate " << CStr(r[1]);
-      out << (CBool(r[3]) ? " (triangulation)" : "") << "\n";
-    }
-
-    const Variant id = db.Scalar(
-        "SELECT D.ID FROM SDInvoice D ORDER BY (SELECT count(*) FROM SDInvoiceRow R WHERE R.IDDoc = D.ID) DESC, D.ID "
-        "LIMIT 1");
-    if (!id.IsNull()) {
-      auto s = host::DocumentSession::Open(conn, "SDInvoice", CLng(id));
-      Ref<host::HostDataObject> h = s->Header();
-      out << "  Sales invoice " << CStr(h->Field("DocNo")) << " of " << IsoDate(h->Field("DocDate"))
-          << ", opened as a document\n";
-      out << "    customer " << CStr(h->Field("GRCompany.Name")) << ", " << CStr(h->Field("CompanyAddr")) << "\n";
-      out << "    terms " << CStr(h->Field("GRTermPayment.Name")) << ", due " << IsoDate(h->Field("PromptDate"))
-          << ", currency " << CStr(h->Field("GRCurrency.Code")) << "\n";
-      Ref<host::HostDataObject> rows = s->Rows();
-      for (rows->MoveFirst(); !rows->IsEOF(); rows->MoveNext())
-        out << "    " << Pad(CStr(rows->Field("GRArticle.Code")), 13) << Pad(CStr(rows->Field("Name")), 30)
-            << Fixed(rows->Field("Quantity"), 2) << " " << Pad(CStr(rows->Field("GRUnit.Code")), 3) << " x "
-            << Fixed(rows->Field("UnitPrice"), 2) << " = " << Fixed(rows->Field("Amount"), 2) << ", VAT "
-            << Fixed(rows->Field("GRTax.TaxPercent"), 0) << "% " << Fixed(rows->Field("TaxAmount"), 2) << "\n";
-      out << "    VAT " << Fixed(h->Field("TaxAmount"), 2) << ", total " << Fixed(h->Field("TotalAmount"), 2) << "\n";
-      ServerCalls(out, conn, h, rows);
-      s->Close();
-    }
+    Companies(out, conn->db());
+    Articles(out, conn->db());
+    Stock(out, conn->db());
+    Currencies(out, *conn);
+    Invoice(out, conn);
   }
   if (!keep) {
     std::error_code ec;

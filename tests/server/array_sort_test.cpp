@@ -12,7 +12,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/operators.h"
-#include "server/sql_utils.h"
+#include "server/array_sort.h"
 
 namespace xal::server {
 namespace {

@@ -5,7 +5,7 @@
 #include <filesystem>
 #include <fstream>
 
-#include "server/sql_utils.h"
+#include "server/files.h"
 
 namespace xal::server {
 namespace {
