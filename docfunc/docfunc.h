@@ -79,6 +79,16 @@ class DocFunc : public Object {
   Variant DSeries();
   Variant DRowDiscount();
 
+  // ---- Prices and discounts (prices.cpp) --------------------------------------------------------
+  bool VPriceList(bool pAsk = true);
+  bool VPriceCut(bool pAsk = true);
+  bool WPriceCut();
+  bool VDiscount();
+  // Fills the price fields of one row from the company prices and the price lists.
+  bool FillPrice(Ref<xal::DataObject>& pRowOB);
+  bool ComputePercentAmount();
+  bool ComputePercentPricelist();
+
   // ---- For the host and tests (not in the type library) ----------------------------------------
   const DocState& State() const { return st_; }
 
