@@ -79,8 +79,10 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
   }
+  // A row is new while it has no stored record yet.
   void DoOnNewRow(bool& RetVal) override {
-    RetVal = true;
+    auto s = session_.lock();
+    RetVal = s && s->rows_ && s->rows_->RowState(kRowNotStored);
     Log("OnNewRow()");
   }
   void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {
