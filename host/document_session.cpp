@@ -82,8 +82,10 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
     Log("FreeCachedRows(" + Q(sData) + "," + Q(sLink) + ")");
   }
+  // A row is new while it has no stored record yet.
   void DoOnNewRow(bool& RetVal) override {
-    RetVal = true;
+    auto s = session_.lock();
+    RetVal = s && s->rows_ && s->rows_->RowState(kRowNotStored);
     Log("OnNewRow()");
   }
   void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {

@@ -56,7 +56,8 @@ TEST(DocFuncSession, TheSessionsDocFunc) {
        R"({"id":16,"result":{"type":"String","value":"AddMenuItem(\"Amount discount\",\"@ComputePercentAmount\"); )"
        R"(AddMenuItem(\"Pricelist discount\",\"@ComputePercentPricelist\"); AddMenuItem(\"Client card\",\"@ClientCard\"); )"
        R"(AddMenuItem(\"Interest note info\",\"@InterestNoteInfo\"); StatusMsg(\"\"); )"
-       R"(StatusMsg(\"Missing doc. series\"); StatusMsg(\"\"); MsgBox(\"Pay first\",64)->1"},"byref":{}})"},
+       R"(StatusMsg(\"Missing doc. series\"); RefreshHeader(\"@\"); RefreshHeader(\"TotalAmount\"); StatusMsg(\"\"); )"
+       R"(MsgBox(\"Pay first\",64)->1"},"byref":{}})"},
       {R"({"id":17,"call":2,"member":"Close"})", R"({"id":17,"result":{"type":"Empty"},"byref":{}})"},
       {R"({"id":18,"call":3,"member":"Doc_Valid"})",
        R"({"id":18,"result":{"type":"Boolean","value":true},"byref":{}})"},  // destroyed with the session
