@@ -92,5 +92,41 @@ TEST(DocFuncSession, ADocFuncWiredByHand) {
   std::remove(db.c_str());
 }
 
+// The worked example of the README, request for request.
+TEST(DocFuncSession, ReadmeInvoice) {
+  std::string db = testing::TempDir() + "xal_docfunc_session_readme.db";
+  std::remove(db.c_str());
+  const std::string empty = R"("result":{"type":"Empty"},"byref":{}})";
+  Session s;
+  RunSteps(s, {
+      {R"({"id":1,"open":")" + db + R"("})", R"({"id":1,"result":{"object":1}})"},
+      {R"j({"id":2,"call":1,"member":"Execute","args":["INSERT INTO GRCompany (ID, Code, Name) VALUES (5, 'ACME', 'Acme Ltd')"]})j",
+       R"({"id":2,"result":{"type":"Long","value":1},"byref":{}})"},
+      {R"j({"id":3,"call":1,"member":"Execute","args":["INSERT INTO GRTax (ID, Code, TaxPercent) VALUES (1, 'VAT20', 20)"]})j",
+       R"({"id":3,"result":{"type":"Long","value":1},"byref":{}})"},
+      {R"({"id":4,"document":"SDInvoice","connection":1})", R"({"id":4,"result":{"object":2}})"},
+      {R"({"id":5,"call":2,"member":"DocFunc","kind":"get"})", R"({"id":5,"result":{"object":3},"byref":{}})"},
+      {R"({"id":6,"call":3,"member":"AddNewDocument"})", Answer(6, kTrue)},
+      {R"({"id":7,"call":2,"member":"Header","kind":"get"})", R"({"id":7,"result":{"object":4},"byref":{}})"},
+      {R"({"id":8,"call":4,"member":"Field","kind":"put","args":["IDGRCompany",5]})", Answer(8, empty)},
+      {R"({"id":9,"call":2,"member":"Rows","kind":"get"})", R"({"id":9,"result":{"object":5},"byref":{}})"},
+      {R"({"id":10,"call":5,"member":"AddNew"})", Answer(10, empty)},
+      {R"({"id":11,"call":5,"member":"Field","kind":"put","args":["IDGRTax",1]})", Answer(11, empty)},
+      {R"({"id":12,"call":2,"member":"ClearTranscript"})", Answer(12, empty)},
+      {R"({"id":13,"call":3,"member":"WAmount"})", Answer(13, kTrue)},
+      {R"({"id":14,"call":5,"member":"Field","kind":"put","args":["Amount",{"type":"Currency","value":"25.0000"}]})",
+       Answer(14, empty)},
+      {R"({"id":15,"call":3,"member":"VAmount"})", Answer(15, kTrue)},
+      {R"({"id":16,"call":4,"member":"Field","args":["@NetAmount"]})",
+       R"({"id":16,"result":{"type":"Currency","value":"25.0000"},"byref":{}})"},
+      {R"({"id":17,"call":4,"member":"Field","args":["TotalAmount"]})",
+       R"({"id":17,"result":{"type":"Currency","value":"30.0000"},"byref":{}})"},
+      {R"({"id":18,"call":2,"member":"Transcript","kind":"get"})",
+       R"j({"id":18,"result":{"type":"String","value":"OnNewRow(); RefreshHeader(\"@\"); RefreshHeader(\"TotalAmount\")"},"byref":{}})j"},
+      {R"({"id":19,"call":2,"member":"Save"})", R"({"id":19,"result":{"type":"Long","value":1},"byref":{}})"},
+  });
+  std::remove(db.c_str());
+}
+
 }  // namespace
 }  // namespace xal::app
