@@ -72,12 +72,15 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   }
   void DoCheckCache(const std::string& sData, const std::string& sLink, bool& bExists) override {
     if (auto s = session_.lock()) bExists = s->CachedRows(sData, sLink, false) != nullptr;
+    Log("CheckCachedRows(" + Q(sData) + "," + Q(sLink) + ")->" + (bExists ? "True" : "False"));
   }
   void DoGetCache(const std::string& sData, const std::string& sLink, Ref<DataObject>& obCache) override {
     if (auto s = session_.lock()) obCache = s->CachedRows(sData, sLink, true);
+    Log("CachedRows(" + Q(sData) + "," + Q(sLink) + ")" + (obCache ? "" : "->Nothing"));
   }
   void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
+    Log("FreeCachedRows(" + Q(sData) + "," + Q(sLink) + ")");
   }
   // A row is new while it has no stored record yet.
   void DoOnNewRow(bool& RetVal) override {
@@ -90,6 +93,7 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
     if (!s) return;
     auto it = s->policy_.settings.find(FoldCase(sKey));
     vRetVal = it != s->policy_.settings.end() ? it->second : (vDefault.IsMissing() ? Variant() : vDefault);
+    s->Record("Settings(" + Q(sKey) + ")->" + ArgText(vRetVal));
   }
   void DoAddMenuItem(const std::string& sCaption, const std::string& sFuncName, std::string& sCmdString, bool,
                      int16_t, int16_t, const std::string&) override {
@@ -118,6 +122,7 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
     auto list = MakeRef<xal::Collection>();
     for (int32_t b : s->policy_.selectedBookmarks) list->items().Add(Variant(b));
     SelBookmarks = list;
+    s->Record("SelBookmarks()");
   }
   void DoShowForm(const Variant& FormID, const std::string& Filter, const std::string&, bool,
                   const Ref<DataObject>&, const std::string&) override {
@@ -198,6 +203,7 @@ Ref<DocumentSession> DocumentSession::Open(const Ref<HostConnection>& conn, cons
 DocumentSession::~DocumentSession() { Close(); }
 
 void DocumentSession::Close() {
+  ReleaseDocFunc();
   if (proxy_) proxy_->Destroy();
   proxy_.reset();
   caches_.clear();

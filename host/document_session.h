@@ -58,6 +58,9 @@ class DocumentSession : public Object {
   void SetFunctionAnswer(const std::string& name, const Variant& value);
   void SetInputBoxAnswer(bool confirm, const Variant& values);
 
+  // The form's document logic, wired on first use (Create, the rows bound, Doc_Initialize).
+  ObjectRef DocFunc();
+
   // Writes the header, the rows and the cached sub-rows; returns the document's id.
   int32_t Save();
   // Destroys the proxy and releases the data objects; the session is not used afterwards.
@@ -75,10 +78,12 @@ class DocumentSession : public Object {
   void Record(std::string line) { transcript_.push_back(std::move(line)); }
   Ref<HostDataObject> OpenSubRows(const std::string& link, const Variant& parentID);
   void SaveSubRows(const std::map<int32_t, int32_t>& serialToID);
+  void ReleaseDocFunc();
 
   Ref<HostConnection> conn_;
   std::string docTable_, rowTable_;
   Ref<XALSBEproxy> proxy_;
+  ObjectRef docFunc_;
   Ref<HostDataObject> header_, rows_, savedHeader_;
   std::shared_ptr<Sink> sink_;
   AnswerPolicy policy_;

@@ -102,6 +102,7 @@ void RegisterDocumentSession() {
       .Get<&S::Header>("Header")
       .Get<&S::Rows>("Rows")
       .Get<&S::Connection>("Connection")
+      .Get<&S::DocFunc>("DocFunc")
       .Method<&S::Save>("Save")
       .Method<&S::Close>("Close")
       .Get<&S::TranscriptText>("Transcript")

@@ -94,7 +94,8 @@ TEST_F(Sessions, ScriptedTranscript) {
             Variant("@ComputePercentAmount"));
   EXPECT_EQ(Call(doc, "DataObject", {Variant("Nope")}), Variant::Nothing());
   EXPECT_EQ(s->TranscriptText(),
-            "MsgBox(\"Save changes?\",4)->7; MsgBox(\"Again?\",4)->6; MsgBox(\"Done\",64)->1; StatusMsg(\"\"); "
+            "MsgBox(\"Save changes?\",4)->7; MsgBox(\"Again?\",4)->6; MsgBox(\"Done\",64)->1; "
+            "Settings(\"Rows\")->3; Settings(\"Cols\")->10; StatusMsg(\"\"); "
             "RefreshHeader(\"\"); CmdPost(\"@Save\"); AddMenuItem(\"Percent\",\"ComputePercentAmount\"); "
             "GetObject(\"Nope\")->Nothing");
 }
