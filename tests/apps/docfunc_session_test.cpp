@@ -2,6 +2,7 @@
 // one made by hand (new, the three host objects assigned by reference, Create), with fields set,
 // rows added, handlers called by name and the proxy's events in the transcript.
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <cstdio>
 #include <string>
@@ -25,10 +26,15 @@ void RunSteps(Session& s, const std::vector<Step>& steps) {
 
 const char* kTrue = R"("result":{"type":"Boolean","value":true},"byref":{}})";
 
+// A database file of this test and process (builds may run the same tests side by side).
+std::string TempDb(const std::string& name) {
+  return testing::TempDir() + name + "_" + std::to_string(::getpid()) + ".db";
+}
+
 std::string Answer(int id, const std::string& rest) { return "{\"id\":" + std::to_string(id) + "," + rest; }
 
 TEST(DocFuncSession, ADocFuncWiredByHand) {
-  std::string db = testing::TempDir() + "xal_docfunc_session_plain.db";
+  std::string db = TempDb("xal_docfunc_session_plain");
   std::remove(db.c_str());
   Session s;
   RunSteps(s, {
@@ -56,7 +62,7 @@ TEST(DocFuncSession, ADocFuncWiredByHand) {
 
 // The worked example of the README, request for request.
 TEST(DocFuncSession, ReadmeInvoice) {
-  std::string db = testing::TempDir() + "xal_docfunc_session_readme.db";
+  std::string db = TempDb("xal_docfunc_session_readme");
   std::remove(db.c_str());
   const std::string empty = R"("result":{"type":"Empty"},"byref":{}})";
   Session s;
