@@ -5,12 +5,14 @@
 // W… before it is edited, D… defaults), and commands registered as menu items.
 // Every handler runs through one template (docfunc/handler.h): errors end the handler, are shown
 // in the status line and never reach the script; refreshes and totals are deferred to the
-// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp.
+// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp,
+// quantities.cpp, taxes.cpp, totals.cpp, prices.cpp.
 // Ownership: the object holds Refs to the proxy, the data objects, the connection and the server
 // until Destroy releases them; the host keeps its own references.
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <string>
 
 #include "bridge/host_model.h"
@@ -79,6 +81,16 @@ class DocFunc : public Object {
   Variant DSeries();
   Variant DRowDiscount();
 
+  // ---- Prices and discounts (prices.cpp) --------------------------------------------------------
+  bool VPriceList(bool pAsk = true);
+  bool VPriceCut(bool pAsk = true);
+  bool WPriceCut();
+  bool VDiscount();
+  // Fills the price fields of one row from the company prices and the price lists.
+  bool FillPrice(Ref<xal::DataObject>& pRowOB);
+  bool ComputePercentAmount();
+  bool ComputePercentPricelist();
+
   // ---- For the host and tests (not in the type library) ----------------------------------------
   const DocState& State() const { return st_; }
 
@@ -135,7 +147,7 @@ class DocFunc : public Object {
   std::string CodeOf(const std::string& table, int32_t id);
   void RunHeaderHandler(const char* name);
 
-  // ---- Amounts (amounts.cpp) --------------------------------------------------------------------
+  // ---- Amounts, quantities, taxes and totals (amounts.cpp, quantities.cpp, taxes.cpp, totals.cpp)
   void ComputeDocTotals(bool Full);
   bool RecomputeRows(bool Full);
   bool RecomputeRow(Ref<xal::DataObject>& Row, bool Full);
@@ -145,6 +157,43 @@ class DocFunc : public Object {
   void InitialTotals(const StoredTaxes& taxes);
   // The quantity `quantity` of unit `unit` in unit `baseUnit`, through the units' relations.
   double UnitToBase(double quantity, int32_t unit, int32_t baseUnit);
+  // The top of a unit's chain of first units, and how many of it the unit holds.
+  struct UnitChain {
+    int32_t top;
+    double factor;
+  };
+  UnitChain ChainOfUnit(int32_t unit);
+  // Totals (totals.cpp).
+  void IncrementalTotals(Currency& net, Currency& tax);
+  void FullTotals(Currency& net, Currency& tax, bool currentRowFlips);
+  void WriteTotals(Currency net, Currency tax);
+  void WriteColumnTotals();
+  void WriteCurrencyTotals(const std::string& suffix, Currency storedTax);
+  bool InDelRow() const;
+  // Rows and the particulars of set rows (taxes.cpp).
+  std::string CompletionType(xal::DataObject& row);
+  void ForEachPart(const std::function<void(Ref<xal::DataObject>&)>& step);
+  void ForEachRowAndPart(const std::function<void(xal::DataObject&)>& step);
+  void SetRowTax(xal::DataObject& row, int32_t tax, Currency factor);
+  void ClearRowTaxes(xal::DataObject& row);
+  // Row amounts and figures (amounts.cpp).
+  void ComputeRowAmount(xal::DataObject& row, bool Full);
+  Currency CutAmount(xal::DataObject& row, double listAmount);
+  bool PriceIsCutFree() const;
+  // A value of the price-category pair of the row's article and the document's company
+  // (GRPriceCatRel: "PriceCut", "MinMarkup"); Empty when no pair applies.
+  Variant CategoryPairValue(xal::DataObject& row, const std::string& column);
+  void ShowRowFigures(xal::DataObject& row);
+  double UnitPriceWithTax(xal::DataObject& row, Currency amount, double quantity);
+  void SetMargins(xal::DataObject& row);
+  void CheckMinimumMarkup(xal::DataObject& row, double quantity);
+  // Quantities (quantities.cpp).
+  void SetStatQuantities(xal::DataObject& row, double baseQuantity);
+  void CheckMinimumQuantity(xal::DataObject& row, double baseQuantity);
+  bool CreditRowAmount(xal::DataObject& row, double baseQuantity);
+  bool OrderRowAmount(xal::DataObject& row, double baseQuantity);
+  void SpreadSetCost(xal::DataObject& row);
+  bool CheckLotQuantities(xal::DataObject& row);
 
   DocState st_;
 };

@@ -214,6 +214,8 @@ void HostDataObject::Delete() {
   MoveNext();
 }
 
+void HostDataObject::Undelete() { CurrentRow().isDeleted = false; }
+
 bool HostDataObject::RowState(int32_t state) {
   if (IsEOF()) return false;
   const Row& r = rows_[current_];

@@ -57,6 +57,8 @@ class HostDataObject : public DataObject {
   void SetOwner(const Ref<DataObject>& owner) { owner_ = owner; }
   const std::string& WriteTable() const { return writeTable_; }
   const std::vector<std::string>& Columns() const { return columns_; }
+  // Takes the deletion mark off the current row, as the user's undelete does; it stays current.
+  void Undelete();
   // Rows not marked deleted.
   int32_t ActualRowCount() const;
   // Writes every added, changed or deleted row to the table; deleted rows leave the set.

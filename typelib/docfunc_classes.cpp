@@ -1,6 +1,6 @@
 // Type-library entry of DocFunc: the creatable document-logic object, one line per member in
 // interface order — the three host objects as properties (read, assigned, assigned by
-// reference), then the lifecycle handlers, then the amount, quantity and tax handlers.
+// reference), then the lifecycle handlers, then the amount, quantity and tax handlers, then prices and discounts.
 #include "docfunc/docfunc.h"
 #include "runtime/binding.h"
 
@@ -53,7 +53,14 @@ void RegisterDocFunc() {
       .Method<&D::VDocRow>("VDocRow")
       .Method<&D::DQuantity>("DQuantity")
       .Method<&D::DSeries>("DSeries")
-      .Method<&D::DRowDiscount>("DRowDiscount");
+      .Method<&D::DRowDiscount>("DRowDiscount")
+      .Method<&D::VPriceList>("VPriceList", {Def("pAsk", true)})
+      .Method<&D::VPriceCut>("VPriceCut", {Def("pAsk", true)})
+      .Method<&D::WPriceCut>("WPriceCut")
+      .Method<&D::VDiscount>("VDiscount")
+      .Method<&D::FillPrice>("FillPrice", {Param("pRowOB")})
+      .Method<&D::ComputePercentAmount>("ComputePercentAmount")
+      .Method<&D::ComputePercentPricelist>("ComputePercentPricelist");
 }
 
 const bool kRegistered = (RegisterDocFunc(), true);

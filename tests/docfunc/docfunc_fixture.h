@@ -55,6 +55,10 @@ class DocFuncTest : public host::testing::HostTest {
     std::vector<Variant> args{Variant(ObjectRef(rows))};
     Invoke(df, "SetRowOB", MemberKind::Method, args);
   }
+  // Each field of `data` holds its value.
+  static void ExpectFields(DataObject& data, std::initializer_list<std::pair<const char*, Variant>> fields) {
+    for (const auto& [name, value] : fields) EXPECT_EQ(data.Field(name), value) << name;
+  }
   // Adds a row to the form's rows with the given fields.
   void AddRow(std::initializer_list<std::pair<const char*, Variant>> fields) {
     Ref<DataObject> rows = session->Rows();

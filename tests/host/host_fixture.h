@@ -1,8 +1,11 @@
 // A fresh reference-host database for each test, in a temporary file (so a second connection can
-// open it too), with a few rows to read through links.
+// open it too) named after the test and the process (so builds that run side by side keep apart),
+// with a few rows to read through links.
 #pragma once
 
 #include <gtest/gtest.h>
+
+#include <unistd.h>
 
 #include <filesystem>
 #include <string>
@@ -16,8 +19,8 @@ class HostTest : public ::testing::Test {
  protected:
   void SetUp() override {
     const auto* info = ::testing::UnitTest::GetInstance()->current_test_info();
-    path_ = std::filesystem::temp_directory_path() /
-            (std::string("xalhost_") + info->test_suite_name() + "_" + info->name() + ".db");
+    path_ = std::filesystem::temp_directory_path() / (std::string("xalhost_") + info->test_suite_name() + "_" +
+                                                      info->name() + "_" + std::to_string(::getpid()) + ".db");
     std::filesystem::remove(path_);
     conn = HostConnection::Open(path_.string(), 1);
     Database& db = conn->db();
