@@ -21,9 +21,9 @@ void StringArray::Grow(size_t lines) {
     if (lines > lines_.capacity()) lines_.reserve((lines + kGrowStep - 1) / kGrowStep * kGrowStep);
     lines_.resize(lines);
   } catch (const std::bad_alloc&) {
-    Raise(7);
+    Raise(kErrOutOfMemory);
   } catch (const std::length_error&) {
-    Raise(7);
+    Raise(kErrOutOfMemory);
   }
 }
 

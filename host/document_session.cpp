@@ -1,6 +1,7 @@
 // DocumentSession: the host's side of a document form.
 #include "host/document_session.h"
 
+#include "host/event_transcript.h"
 #include "host/param_list.h"
 #include "runtime/collection.h"
 #include "runtime/convert.h"
@@ -21,33 +22,16 @@ std::string DocLinkColumn(HostConnection& conn, const std::string& rowTable) {
   return "IDDoc";
 }
 
-std::string ArgText(const Variant& v) {
-  if (v.IsString()) return "\"" + v.AsString() + "\"";
-  if (v.IsObject()) return v.AsObject() ? "<object>" : "Nothing";
-  if (v.IsEmpty() || v.IsMissing()) return "";
-  try {
-    return CStr(v);
-  } catch (const VbError&) {
-    return VarTypeName(v.Type());
-  }
-}
-
 }  // namespace
 
 // ---------------------------------------------------------------------------------------------
-// The proxy's event sink: answers from the session and its policy, one transcript line each
+// The proxy's event sink: answers from the session and its policy
 // ---------------------------------------------------------------------------------------------
 
 class DocumentSession::Sink : public XALSBEproxyEvents {
  public:
   explicit Sink(const Ref<DocumentSession>& s) : session_(s) {}
 
-  void DoDataChanged() override { Log("DataChanged()"); }
-  void DoReloadSheet(int32_t NewID, bool& RetVal) override { Log("ReloadSheet(" + std::to_string(NewID) + ")"); }
-  void DoRefreshData(const std::string& s) override { Log("RefreshData(\"" + s + "\")"); }
-  void DoRefreshHeader(const std::string& s) override { Log("RefreshHeader(\"" + s + "\")"); }
-  void DoRefreshBrowser(const std::string& s) override { Log("RefreshBrowser(\"" + s + "\")"); }
-  void DoRefreshRow() override { Log("RefreshRow()"); }
   void DoMsgBox(const std::string& Prompt, int32_t Buttons, const std::string& Title, int32_t& RetVal) override {
     auto s = session_.lock();
     if (!s) return;
@@ -61,14 +45,11 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
     } else {
       RetVal = p.msgBoxDefault;
     }
-    s->Record("MsgBox(\"" + Prompt + "\"," + std::to_string(Buttons) + (Title.empty() ? "" : ",\"" + Title + "\"") +
-              ")->" + std::to_string(RetVal));
   }
   void DoInputBox(const Ref<ParamList>& Params, int32_t Buttons, const std::string& Title, bool& RetVal) override {
     auto s = session_.lock();
     if (!s) return;
     RetVal = s->policy_.inputBox && Params ? s->policy_.inputBox(*Params, Title) : s->policy_.inputBoxDefault;
-    s->Record("InputBox(\"" + Title + "\")->" + (RetVal ? "True" : "False"));
   }
   void DoCheckCache(const std::string& sData, const std::string& sLink, bool& bExists) override {
     if (auto s = session_.lock()) bExists = s->CachedRows(sData, sLink, false) != nullptr;
@@ -79,10 +60,7 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
     if (auto s = session_.lock()) s->ReleaseCachedRows(sData, sLink);
   }
-  void DoOnNewRow(bool& RetVal) override {
-    RetVal = true;
-    Log("OnNewRow()");
-  }
+  void DoOnNewRow(bool& RetVal) override { RetVal = true; }
   void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {
     auto s = session_.lock();
     if (!s) return;
@@ -92,23 +70,15 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
   void DoAddMenuItem(const std::string& sCaption, const std::string& sFuncName, std::string& sCmdString, bool,
                      int16_t, int16_t, const std::string&) override {
     sCmdString = "@" + sFuncName;
-    Log("AddMenuItem(\"" + sCaption + "\",\"" + sFuncName + "\")");
   }
   void DoAddCmdTarget(const std::string& Cmd, const std::string& FuncName, bool, bool& RetVal) override {
     RetVal = true;
-    Log("AddCmdTarget(\"" + Cmd + "\",\"" + FuncName + "\")");
-  }
-  void DoStatusMsg(const std::string& Msg) override { Log("StatusMsg(\"" + Msg + "\")"); }
-  void DoCmdExecute(const std::string& Cmd, bool Posted, const Variant& Param) override {
-    Log(std::string(Posted ? "CmdPost" : "CmdExecute") + "(\"" + Cmd + "\"" +
-        (Param.IsEmpty() || Param.IsMissing() ? "" : "," + ArgText(Param)) + ")");
   }
   void DoInvokeFunc(const std::string& FuncName, Variant& RetVal) override {
     auto s = session_.lock();
     if (!s) return;
     auto it = s->policy_.functions.find(FoldCase(FuncName));
     if (it != s->policy_.functions.end()) RetVal = it->second;
-    s->Record("InvokeFunc(\"" + FuncName + "\")");
   }
   void GetSelBookmarks(ObjectRef& SelBookmarks) override {
     auto s = session_.lock();
@@ -117,10 +87,6 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
     for (int32_t b : s->policy_.selectedBookmarks) list->items().Add(Variant(b));
     SelBookmarks = list;
   }
-  void DoShowForm(const Variant& FormID, const std::string& Filter, const std::string&, bool,
-                  const Ref<DataObject>&, const std::string&) override {
-    Log("ShowForm(" + ArgText(FormID) + ",\"" + Filter + "\")");
-  }
   void GetObject(const std::string& Name, int32_t, Ref<DataObject>& DataOB) override {
     auto s = session_.lock();
     if (!s) return;
@@ -128,33 +94,9 @@ class DocumentSession::Sink : public XALSBEproxyEvents {
       DataOB = s->header_;
     else if (TextEquals(Name, s->rowTable_) || TextEquals(Name, "Rows"))
       DataOB = s->rows_;
-    s->Record("GetObject(\"" + Name + "\")" + (DataOB ? "" : "->Nothing"));
-  }
-  void DoXALExecuteCB(const Ref<DataObject>&, const std::string& FuncName, const Ref<ParamList>&,
-                      const std::string&, Variant&) override {
-    Log("XALExecuteCB(\"" + FuncName + "\")");
-  }
-  void DoReloadLayout(const Variant&, const std::string& AreaName, Variant&) override {
-    Log("ReloadLayout(\"" + AreaName + "\")");
-  }
-  void DoPrintReport(int32_t ReportID, const Variant&, Variant&) override {
-    Log("PrintReport(" + std::to_string(ReportID) + ")");
-  }
-  void DoSendReport(int32_t ReportID, const Variant&, const std::string& Address, const std::string&,
-                    Variant&) override {
-    Log("SendReport(" + std::to_string(ReportID) + ",\"" + Address + "\")");
-  }
-  void DoSendMail(Ref<ParamList>&, Variant&) override { Log("SendMail()"); }
-  void Properties(const std::string& Name, bool, Variant&) override { Log("Properties(\"" + Name + "\")"); }
-  void DoExportReport(int32_t ReportID, const Variant&, const std::string& Filename, Ref<ParamList>&,
-                      Variant&) override {
-    Log("ExportReport(" + std::to_string(ReportID) + ",\"" + Filename + "\")");
   }
 
  private:
-  void Log(std::string line) {
-    if (auto s = session_.lock()) s->Record(std::move(line));
-  }
   WeakRef<DocumentSession> session_;
 };
 
@@ -187,6 +129,12 @@ Ref<DocumentSession> DocumentSession::Open(const Ref<HostConnection>& conn, cons
   s->proxy_ = MakeRef<XALSBEproxy>();
   s->sink_ = std::make_shared<Sink>(s);
   s->proxy_->Events().Connect(s->sink_);
+  // The transcript listens after the answers, so its lines show them.
+  WeakRef<DocumentSession> weak = s;
+  s->proxy_->Events().Connect(std::make_shared<XALSBEproxyEventForwarder>(
+      MakeRef<ProxyEventTranscript>([weak](std::string line) {
+        if (auto alive = weak.lock()) alive->Record(std::move(line));
+      })));
   Ref<DataObject> header = s->header_, rows = s->rows_;
   s->proxy_->AddDataOB("DocData", header);
   s->proxy_->AddDataOB(s->rowTable_, rows);

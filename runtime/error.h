@@ -13,14 +13,18 @@ namespace xal {
 enum ErrNo : int32_t {
   kErrInvalidCall = 5,         // invalid procedure call or argument
   kErrOverflow = 6,
+  kErrOutOfMemory = 7,
   kErrSubscript = 9,           // subscript out of range
   kErrDivByZero = 11,
   kErrTypeMismatch = 13,
+  kErrInternal = 51,
   kErrObjectNotSet = 91,
   kErrBadPattern = 93,         // invalid pattern string (Like)
   kErrInvalidNull = 94,
   kErrObjectRequired = 424,
+  kErrCannotCreate = 429,      // the class cannot be created (not creatable, no factory)
   kErrNoMember = 438,
+  kErrAutomation = 440,        // a host failure that is not a run-time error
   kErrNotOptional = 449,
   kErrWrongArgCount = 450,
   kErrDuplicateKey = 457,

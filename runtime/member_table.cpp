@@ -91,7 +91,7 @@ const MemberInfo* ClassInfo::FindById(int32_t dispid, MemberKind kind) const {
 }
 
 ObjectRef ClassInfo::Create() const {
-  if (!factory_) Raise(429);
+  if (!factory_) Raise(kErrCannotCreate);
   return factory_();
 }
 
@@ -157,7 +157,7 @@ const ClassInfo* ClassOf(const Object& obj) {
 
 ObjectRef CreateObject(std::string_view className) {
   const ClassInfo* info = TypeRegistry::Instance().ByName(className);
-  if (!info || !info->creatable()) Raise(429);
+  if (!info || !info->creatable()) Raise(kErrCannotCreate);
   return info->Create();
 }
 

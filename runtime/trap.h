@@ -19,11 +19,6 @@
 
 namespace xal {
 
-// Number the trap helpers give a host failure that is not a run-time error ("Automation error").
-constexpr int32_t kErrAutomation = 440;
-// Number for memory exhausted inside a host call ("Out of memory").
-constexpr int32_t kErrOutOfMemory = 7;
-
 // The number and text of a trapped error.
 struct TrappedError {
   int32_t number = 0;

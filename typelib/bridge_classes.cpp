@@ -12,87 +12,6 @@ namespace {
 
 using E = XALSBEproxyEvents;
 
-// Lets a script host's generic sink receive the document proxy's events and answer them.
-class ProxyEventsAdapter : public XALSBEproxyEvents {
- public:
-  explicit ProxyEventsAdapter(std::shared_ptr<GenericSink> s) : s_(std::move(s)) {}
-  void DoDataChanged() override { ForwardEvent(*s_, 1, "DoDataChanged"); }
-  void DoReloadSheet(int32_t NewID, bool& RetVal) override { ForwardEvent(*s_, 2, "DoReloadSheet", NewID, RetVal); }
-  void DoRefreshData(const std::string& sWhat) override { ForwardEvent(*s_, 3, "DoRefreshData", sWhat); }
-  void DoRefreshHeader(const std::string& sWhat) override { ForwardEvent(*s_, 4, "DoRefreshHeader", sWhat); }
-  void DoRefreshBrowser(const std::string& sWhat) override { ForwardEvent(*s_, 5, "DoRefreshBrowser", sWhat); }
-  void DoRefreshRow() override { ForwardEvent(*s_, 6, "DoRefreshRow"); }
-  void DoMsgBox(const std::string& Prompt, int32_t Buttons, const std::string& Title, int32_t& RetVal) override {
-    ForwardEvent(*s_, 7, "DoMsgBox", Prompt, Buttons, Title, RetVal);
-  }
-  void DoInputBox(const Ref<ParamList>& Params, int32_t Buttons, const std::string& Title, bool& RetVal) override {
-    ForwardEvent(*s_, 8, "DoInputBox", Params, Buttons, Title, RetVal);
-  }
-  void DoCheckCache(const std::string& sData, const std::string& sLink, bool& bExists) override {
-    ForwardEvent(*s_, 9, "DoCheckCache", sData, sLink, bExists);
-  }
-  void DoGetCache(const std::string& sData, const std::string& sLink, Ref<DataObject>& obCache) override {
-    ForwardEvent(*s_, 10, "DoGetCache", sData, sLink, obCache);
-  }
-  void DoReleaseCache(const std::string& sData, const std::string& sLink) override {
-    ForwardEvent(*s_, 11, "DoReleaseCache", sData, sLink);
-  }
-  void DoOnNewRow(bool& RetVal) override { ForwardEvent(*s_, 12, "DoOnNewRow", RetVal); }
-  void GetSettings(const std::string& sKey, const Variant& vDefault, Variant& vRetVal) override {
-    ForwardEvent(*s_, 13, "GetSettings", sKey, vDefault, vRetVal);
-  }
-  void DoAddMenuItem(const std::string& sCaption, const std::string& sFuncName, std::string& sCmdString,
-                     bool fForceEdit, int16_t iShift, int16_t iKeyCode, const std::string& sMode) override {
-    ForwardEvent(*s_, 14, "DoAddMenuItem", sCaption, sFuncName, sCmdString, fForceEdit, iShift, iKeyCode, sMode);
-  }
-  void DoAddCmdTarget(const std::string& Cmd, const std::string& FuncName, bool ProcessAfterXAL,
-                      bool& RetVal) override {
-    ForwardEvent(*s_, 15, "DoAddCmdTarget", Cmd, FuncName, ProcessAfterXAL, RetVal);
-  }
-  void DoStatusMsg(const std::string& Msg) override { ForwardEvent(*s_, 16, "DoStatusMsg", Msg); }
-  void DoCmdExecute(const std::string& Cmd, bool Posted, const Variant& Param) override {
-    ForwardEvent(*s_, 17, "DoCmdExecute", Cmd, Posted, Param);
-  }
-  void DoInvokeFunc(const std::string& FuncName, Variant& RetVal) override {
-    ForwardEvent(*s_, 18, "DoInvokeFunc", FuncName, RetVal);
-  }
-  void GetSelBookmarks(ObjectRef& SelBookmarks) override { ForwardEvent(*s_, 19, "GetSelBookmarks", SelBookmarks); }
-  void DoShowForm(const Variant& FormID, const std::string& Filter, const std::string& Order, bool Linked,
-                  const Ref<DataObject>& DataOB, const std::string& OpenMode) override {
-    ForwardEvent(*s_, 20, "DoShowForm", FormID, Filter, Order, Linked, DataOB, OpenMode);
-  }
-  void GetObject(const std::string& Name, int32_t Mode, Ref<DataObject>& DataOB) override {
-    ForwardEvent(*s_, 21, "GetObject", Name, Mode, DataOB);
-  }
-  void DoXALExecuteCB(const Ref<DataObject>& DataOB, const std::string& FuncName, const Ref<ParamList>& FuncParms,
-                      const std::string& Caption, Variant& RetVal) override {
-    ForwardEvent(*s_, 22, "DoXALExecuteCB", DataOB, FuncName, FuncParms, Caption, RetVal);
-  }
-  void DoReloadLayout(const Variant& Layout, const std::string& AreaName, Variant& RetVal) override {
-    ForwardEvent(*s_, 23, "DoReloadLayout", Layout, AreaName, RetVal);
-  }
-  void DoPrintReport(int32_t ReportID, const Variant& Selection, Variant& RetVal) override {
-    ForwardEvent(*s_, 24, "DoPrintReport", ReportID, Selection, RetVal);
-  }
-  void DoSendReport(int32_t ReportID, const Variant& Selection, const std::string& Address,
-                    const std::string& AttachmentType, Variant& RetVal) override {
-    ForwardEvent(*s_, 25, "DoSendReport", ReportID, Selection, Address, AttachmentType, RetVal);
-  }
-  void DoSendMail(Ref<ParamList>& Params, Variant& RetVal) override {
-    ForwardEvent(*s_, 27, "DoSendMail", Params, RetVal);
-  }
-  void Properties(const std::string& Name, bool WriteEnabled, Variant& Value) override {
-    ForwardEvent(*s_, 26, "Properties", Name, WriteEnabled, Value);
-  }
-  void DoExportReport(int32_t ReportID, const Variant& Selection, const std::string& Filename,
-                      Ref<ParamList>& Params, Variant& RetVal) override {
-    ForwardEvent(*s_, 28, "DoExportReport", ReportID, Selection, Filename, Params, RetVal);
-  }
-
- private:
-  std::shared_ptr<GenericSink> s_;
-};
-
 class CallbackEventsAdapter : public XALCBProxyEvents {
  public:
   explicit CallbackEventsAdapter(std::shared_ptr<GenericSink> s) : s_(std::move(s)) {}
@@ -117,44 +36,18 @@ class CallbackEventsAdapter : public XALCBProxyEvents {
   std::shared_ptr<GenericSink> s_;
 };
 
+// The proxy's events for the type library, from the one event list.
 const EventInterfaceInfo& ProxyEventTable() {
-  return EventBuilder<E>("__XALSBEproxy")
-      .Event<&E::DoDataChanged>("DoDataChanged", 1)
-      .Event<&E::DoReloadSheet>("DoReloadSheet", 2, {Param("NewID"), Param("RetVal")})
-      .Event<&E::DoRefreshData>("DoRefreshData", 3, {Param("sWhat")})
-      .Event<&E::DoRefreshHeader>("DoRefreshHeader", 4, {Param("sWhat")})
-      .Event<&E::DoRefreshBrowser>("DoRefreshBrowser", 5, {Param("sWhat")})
-      .Event<&E::DoRefreshRow>("DoRefreshRow", 6)
-      .Event<&E::DoMsgBox>("DoMsgBox", 7, {Param("Prompt"), Param("Buttons"), Param("Title"), Param("RetVal")})
-      .Event<&E::DoInputBox>("DoInputBox", 8, {Param("Params"), Param("Buttons"), Param("Title"), Param("RetVal")})
-      .Event<&E::DoCheckCache>("DoCheckCache", 9, {Param("sData"), Param("sLink"), Param("bExists")})
-      .Event<&E::DoGetCache>("DoGetCache", 10, {Param("sData"), Param("sLink"), Param("obCache")})
-      .Event<&E::DoReleaseCache>("DoReleaseCache", 11, {Param("sData"), Param("sLink")})
-      .Event<&E::DoOnNewRow>("DoOnNewRow", 12, {Param("RetVal")})
-      .Event<&E::GetSettings>("GetSettings", 13, {Param("sKey"), Param("vDefault"), Param("vRetVal")})
-      .Event<&E::DoAddMenuItem>("DoAddMenuItem", 14, {Param("sCaption"), Param("sFuncName"), Param("sCmdString"),
-                                                      Param("fForceEdit"), Param("iShift"), Param("iKeyCode"),
-                                                      Param("sMode")})
-      .Event<&E::DoAddCmdTarget>("DoAddCmdTarget", 15,
-                                 {Param("Cmd"), Param("FuncName"), Param("ProcessAfterXAL"), Param("RetVal")})
-      .Event<&E::DoStatusMsg>("DoStatusMsg", 16, {Param("Msg")})
-      .Event<&E::DoCmdExecute>("DoCmdExecute", 17, {Param("Cmd"), Param("Posted"), Param("Param")})
-      .Event<&E::DoInvokeFunc>("DoInvokeFunc", 18, {Param("FuncName"), Param("RetVal")})
-      .Event<&E::GetSelBookmarks>("GetSelBookmarks", 19, {Param("SelBookmarks")})
-      .Event<&E::DoShowForm>("DoShowForm", 20, {Param("FormID"), Param("Filter"), Param("Order"), Param("Linked"),
-                                                Param("DataOB"), Param("OpenMode")})
-      .Event<&E::GetObject>("GetObject", 21, {Param("Name"), Param("Mode"), Param("DataOB")})
-      .Event<&E::DoXALExecuteCB>("DoXALExecuteCB", 22, {Param("DataOB"), Param("FuncName"), Param("FuncParms"),
-                                                        Param("Caption"), Param("RetVal")})
-      .Event<&E::DoReloadLayout>("DoReloadLayout", 23, {Param("Layout"), Param("AreaName"), Param("RetVal")})
-      .Event<&E::DoPrintReport>("DoPrintReport", 24, {Param("ReportID"), Param("Selection"), Param("RetVal")})
-      .Event<&E::DoSendReport>("DoSendReport", 25, {Param("ReportID"), Param("Selection"), Param("Address"),
-                                                    Param("AttachmentType"), Param("RetVal")})
-      .Event<&E::DoSendMail>("DoSendMail", 27, {Param("Params"), Param("RetVal")})
-      .Event<&E::Properties>("Properties", 26, {Param("Name"), Param("WriteEnabled"), Param("Value")})
-      .Event<&E::DoExportReport>("DoExportReport", 28, {Param("ReportID"), Param("Selection"), Param("Filename"),
-                                                        Param("Params"), Param("RetVal")})
-      .info();
+  EventBuilder<E> b("__XALSBEproxy");
+  auto paramsOf = [](int32_t dispid) {
+    std::vector<Param> out;
+    for (std::string& name : ProxyEventParams(*FindProxyEvent(dispid))) out.emplace_back(std::move(name));
+    return out;
+  };
+#define XAL_DESCRIBE_PROXY_EVENT(dispid, name, params, names, log) b.Event<&E::name>(#name, dispid, paramsOf(dispid));
+  XAL_PROXY_EVENTS(XAL_DESCRIBE_PROXY_EVENT)
+#undef XAL_DESCRIBE_PROXY_EVENT
+  return b.info();
 }
 
 void RegisterProxy() {
@@ -219,7 +112,7 @@ void RegisterProxy() {
       .Method<&P::Properties>("Properties", {Param("Name")})
       .Method<&P::SendMail>("SendMail", {Param("Params")})
       .Method<&P::ExportReport>("ExportReport", {Param("ReportID"), Opt("Selection"), Opt("Filename"), Opt("Params")});
-  RegisterEventSource<P, E, ProxyEventsAdapter>(b.info(), ProxyEventTable());
+  RegisterEventSource<P, E, XALSBEproxyEventForwarder>(b.info(), ProxyEventTable());
 }
 
 void RegisterCmdStat() {

@@ -7,6 +7,7 @@
 
 #include "runtime/convert.h"
 #include "runtime/dates.h"
+#include "runtime/error.h"
 #include "runtime/locale.h"
 #include "runtime/text.h"
 
@@ -64,6 +65,12 @@ Variant ParseCallArg(std::string_view w) {
   Variant number;
   if (BareNumber(w, number)) return number;
   return Variant(std::string(w));
+}
+
+MemberKind ParseMemberKind(std::string_view word) {
+  for (MemberKind k : {MemberKind::Method, MemberKind::Get, MemberKind::Put, MemberKind::PutRef})
+    if (TextEquals(word, MemberKindName(k))) return k;
+  Raise(kErrInvalidCall, "Invalid procedure call or argument: kind \"" + std::string(word) + "\"");
 }
 
 }  // namespace xal::app

@@ -7,8 +7,13 @@
 
 #include <string_view>
 
+#include "runtime/member_table.h"
 #include "runtime/variant.h"
 
 namespace xal::app {
 Variant ParseCallArg(std::string_view word);
+
+// The member kind a call names, for `xal call --kind` and the session's "kind" alike: "method",
+// "get", "put" or "putref" in any letter case; any other word is run-time error 5.
+MemberKind ParseMemberKind(std::string_view word);
 }

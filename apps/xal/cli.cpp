@@ -50,23 +50,22 @@ std::string PlainText(const Variant& v) {
 
 int CallCommand(const std::vector<std::string>& words) {
   bool json = false;
-  MemberKind kind = MemberKind::Method;
+  std::string kindWord = "method";
   std::vector<std::string> rest;
   for (size_t i = 0; i < words.size(); ++i) {
-    if (words[i] == "--json") {
+    if (words[i] == "--json")
       json = true;
-    } else if (words[i] == "--kind" && i + 1 < words.size()) {
-      const std::string& k = words[++i];
-      kind = k == "get" ? MemberKind::Get : k == "put" ? MemberKind::Put : k == "putref" ? MemberKind::PutRef : MemberKind::Method;
-    } else {
+    else if (words[i] == "--kind" && i + 1 < words.size())
+      kindWord = words[++i];
+    else
       rest.push_back(words[i]);
-    }
   }
   if (rest.size() < 2) {
     std::fputs(kUsage, stderr);
     return 2;
   }
   try {
+    const MemberKind kind = ParseMemberKind(kindWord);
     ObjectRef obj = CreateObject(rest[0]);
     std::vector<Variant> args;
     for (size_t i = 2; i < rest.size(); ++i) args.push_back(ParseCallArg(rest[i]));

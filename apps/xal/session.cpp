@@ -3,6 +3,7 @@
 
 #include <iostream>
 
+#include "apps/xal/call_args.h"
 #include "host/connection.h"
 #include "host/document_session.h"
 #include "runtime/dispatch.h"
@@ -63,12 +64,7 @@ ObjectRef Session::ObjectOf(const Json& handle) const {
 
 Json Session::Call(const Json& req) {
   ObjectRef target = ObjectOf(req.at("call"));
-  std::string kindText = req.value("kind", "method");
-  MemberKind kind = MemberKind::Method;
-  if (TextEquals(kindText, "get")) kind = MemberKind::Get;
-  else if (TextEquals(kindText, "put")) kind = MemberKind::Put;
-  else if (TextEquals(kindText, "putref")) kind = MemberKind::PutRef;
-  else if (!TextEquals(kindText, "method")) Raise(kErrInvalidCall, "Invalid procedure call or argument: kind \"" + kindText + "\"");
+  const MemberKind kind = ParseMemberKind(req.value("kind", "method"));
   std::vector<Variant> args;
   if (req.contains("args"))
     for (const auto& a : req["args"]) args.push_back(FromJson(a, handles_));
@@ -151,7 +147,7 @@ std::string Session::Handle(std::string_view line) {
   } catch (const Json::exception& e) {
     answer = {{"error", {{"number", int(kErrInvalidCall)}, {"description", std::string("Invalid request: ") + e.what()}}}};
   } catch (const std::exception& e) {
-    answer = {{"error", {{"number", 51}, {"description", std::string("Internal error: ") + e.what()}}}};
+    answer = {{"error", {{"number", int(kErrInternal)}, {"description", std::string("Internal error: ") + e.what()}}}};
   }
   Json out = {{"id", id}};
   for (auto it = answer.begin(); it != answer.end(); ++it) out[it.key()] = it.value();

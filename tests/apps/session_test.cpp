@@ -12,10 +12,13 @@
 
 #include "apps/xal/call_args.h"
 #include "apps/xal/typelib_json.h"
+#include "error_of.h"
 #include "runtime/member_table.h"
 
 namespace xal::app {
 namespace {
+
+using test::ErrorOf;
 
 TEST(Session, TranscriptGolden) {
   Session s;
@@ -134,6 +137,27 @@ TEST(CallArgs, Words) {
   }
 }
 
+// `xal call --kind` and the session's "kind" read the same words and refuse the same others.
+TEST(CallArgs, MemberKinds) {
+  struct Row {
+    const char* word;
+    MemberKind kind;
+  } rows[] = {{"method", MemberKind::Method}, {"get", MemberKind::Get},   {"PUT", MemberKind::Put},
+              {"PutRef", MemberKind::PutRef}, {"Method", MemberKind::Method}};
+  for (const auto& r : rows) {
+    SCOPED_TRACE(r.word);
+    EXPECT_EQ(ParseMemberKind(r.word), r.kind);
+  }
+  for (const char* bad : {"bogus", "", "gets", "put ", "let"}) {
+    SCOPED_TRACE(bad);
+    EXPECT_EQ(ErrorOf([&] { ParseMemberKind(bad); }), kErrInvalidCall);
+  }
+  Session s;
+  s.Handle(R"({"id":1,"new":"XALProbe"})");
+  EXPECT_EQ(s.Handle(R"({"id":2,"call":1,"member":"Add","args":[2,3],"kind":"bogus"})"),
+            R"({"id":2,"error":{"number":5,"description":"Invalid procedure call or argument: kind \"bogus\""}})");
+}
+
 TEST(TypeLibraryJson, ProbeMembersInInterfaceOrder) {
   Json lib = TypeLibraryJson(TypeRegistry::Instance());
   const Json* probe = nullptr;
@@ -181,6 +205,9 @@ TEST(XalBinary, CallCommand) {
   EXPECT_EQ(RunXal("call XALProbe Typed i:1 l:2 f:2.5 c:1.25 d:2009-03-05 b:true s:x"),
             "1|2|2.5|1.25|39877|True|x\n");
   EXPECT_EQ(RunXal("call XALProbe Nope"), "error 438: Object doesn't support this property or method\n");
+  EXPECT_EQ(RunXal("call XALProbe Add 2 3 --kind bogus"),
+            "error 5: Invalid procedure call or argument: kind \"bogus\"\n");
+  EXPECT_EQ(RunXal("call XALProbe Add 2 3 --kind METHOD"), "5\n");
 }
 
 }  // namespace

@@ -99,6 +99,52 @@ TEST_F(Sessions, ScriptedTranscript) {
             "GetObject(\"Nope\")->Nothing");
 }
 
+// Every event of the proxy through the session: the logged ones give these lines, the data plumbing
+// (caches, settings, selection) none.
+TEST_F(Sessions, TranscriptLineOfEveryEvent) {
+  auto s = DocumentSession::Open(conn, "SDInvoice", 1000);
+  ObjectRef doc = s->Proxy();
+  ObjectRef params = conn->Server()->NewParamList();
+  struct Row {
+    const char* member;
+    std::vector<Variant> args;
+    const char* line;  // "" when the event writes none
+  } rows[] = {
+      {"DataChanged", {}, "DataChanged()"},
+      {"ReloadSheet", {Variant(5)}, "ReloadSheet(5)"},
+      {"RefreshData", {Variant("a")}, "RefreshData(\"a\")"},
+      {"RefreshBrowser", {Variant("b")}, "RefreshBrowser(\"b\")"},
+      {"RefreshRow", {}, "RefreshRow()"},
+      {"MsgBox", {Variant("Q"), Variant(4), Variant("T")}, "MsgBox(\"Q\",4,\"T\")->6"},
+      {"InputBox", {Variant(params), Variant(1), Variant("Amount")}, "InputBox(\"Amount\")->False"},
+      {"OnNewRow", {}, "OnNewRow()"},
+      {"AddCmdTarget", {Variant("Cmd"), Variant("Fn")}, "AddCmdTarget(\"Cmd\",\"Fn\")"},
+      {"CmdExecute", {Variant("@X"), Variant(2.5)}, "CmdExecute(\"@X\",2.5)"},
+      {"CmdExecute", {Variant("@Y")}, "CmdExecute(\"@Y\")"},
+      {"InvokeFunc", {Variant("F")}, "InvokeFunc(\"F\")"},
+      {"ShowForm", {Variant(12), Variant("a=1")}, "ShowForm(12,\"a=1\")"},
+      {"DataObject", {Variant("Rows")}, "GetObject(\"Rows\")"},
+      {"XALExecuteCB", {Variant::Nothing(), Variant("Fn")}, "XALExecuteCB(\"Fn\")"},
+      {"ReloadLayout", {Variant(1), Variant("Area")}, "ReloadLayout(\"Area\")"},
+      {"PrintReport", {Variant(3)}, "PrintReport(3)"},
+      {"SendReport", {Variant(3), Variant(), Variant("a@b")}, "SendReport(3,\"a@b\")"},
+      {"Properties", {Variant("P")}, "Properties(\"P\")"},
+      {"SendMail", {Variant(params)}, "SendMail()"},
+      {"ExportReport", {Variant(3), Variant(), Variant("f.pdf")}, "ExportReport(3,\"f.pdf\")"},
+      {"CachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
+      {"CheckCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
+      {"FreeCachedRows", {Variant("SDInvoiceRow"), Variant("Next")}, ""},
+      {"Settings", {Variant("k")}, ""},
+      {"SelBookmarks", {}, ""},
+  };
+  for (const auto& r : rows) {
+    SCOPED_TRACE(r.member);
+    s->ClearTranscript();
+    Call(doc, r.member, r.args);
+    EXPECT_EQ(s->TranscriptText(), r.line);
+  }
+}
+
 TEST_F(Sessions, InputBoxPolicyFillsTheList) {
   auto s = DocumentSession::Open(conn, "SDInvoice");
   s->Policy().inputBox = [](ParamList& p, const std::string&) {

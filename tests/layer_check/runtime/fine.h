@@ -1,0 +1,2 @@
+// A header that uses only itself and the standard library.
+#include <string>

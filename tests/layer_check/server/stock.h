@@ -1,0 +1,4 @@
+// A header that uses only what is below it.
+#include <vector>
+
+#include "runtime/fine.h"
