@@ -119,8 +119,9 @@ class DocFunc : public Object {
   // ---- Options and small reads shared by all topics ---------------------------------------------
   Variant UserOption(const std::string& section, const std::string& key, const Variant& defaultValue);
   Variant SystemOption(const std::string& section, const std::string& key, const Variant& defaultValue);
-  // The first row of an SQL query (a read-only snapshot).
+  // A read-only snapshot of an SQL query on its first row; never Nothing (error 91 instead).
   Ref<xal::DataObject> OpenQuery(const std::string& sql);
+  Ref<ParamList> NewParams();
   // A keyed host message ("Err_DocDateMissing") in the current language.
   std::string HostText(const std::string& key);
   void Status(const std::string& text);

@@ -9,7 +9,7 @@
 
 namespace xal {
 
-using docfunc::TrimmedOf;
+using namespace docfunc;  // NOLINT: the value readers of this folder
 
 // ---------------------------------------------------------------------------------------------
 // Enter and leave
@@ -111,7 +111,15 @@ Variant DocFunc::SystemOption(const std::string& section, const std::string& key
 }
 
 Ref<xal::DataObject> DocFunc::OpenQuery(const std::string& sql) {
-  return Require(st_.Server.get()).OpenQuery(sql, kQueryReadOnly, "", "");
+  Ref<xal::DataObject> q = st_.Server->OpenQuery(sql, kQueryReadOnly, "", "");
+  Require(q);
+  return q;
+}
+
+Ref<ParamList> DocFunc::NewParams() {
+  Ref<ParamList> p = st_.Server->NewParamList();
+  Require(p);
+  return p;
 }
 
 std::string DocFunc::HostText(const std::string& key) { return st_.Server->Text(key, 2, CurrentLangID()); }

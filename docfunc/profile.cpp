@@ -3,6 +3,7 @@
 // which options are read (section, key, default) and which deal states the kind offers; then come
 // the closing steps every kind runs, the value lists of the fields, and the table-name lists of the
 // register forms, whose texts are the host's captions from its table catalogue.
+#include <optional>
 #include <string_view>
 #include <variant>
 #include <vector>
@@ -15,11 +16,7 @@
 
 namespace xal {
 
-using docfunc::FlagOf;
-using docfunc::IsBlank;
-using docfunc::LongOf;
-using docfunc::TextOf;
-using docfunc::TrimmedOf;
+using namespace docfunc;  // NOLINT: the value readers of this folder
 
 namespace {
 
@@ -202,7 +199,9 @@ const ProfileRow kProfile[] = {
     {.tables = {"DDStoreDRow"},
      .when = {HeaderTest::kTableNotIn, {"DDProduction", "DDMovement"}},
      .setTrue = {&S::ComputePrices, &S::UsePriceCat}},
-    {.tables = {"DDStoreDRow"}, .when = {HeaderTest::kTableIn, {"SDConsignmD", "SDExpenseD"}}, .setTrue = {&S::IsSales}},
+    {.tables = {"DDStoreDRow"},
+     .when = {HeaderTest::kTableIn, {"SDConsignmD", "SDExpenseD"}},
+     .setTrue = {&S::IsSales}},
     {.tables = {"DDStoreDRow"},
      .when = {HeaderTest::kRefTypeIs, {"PDReceiptD"}},
      .texts = {{&S::StoreField, "IDReceiverStore"}}},
@@ -232,12 +231,6 @@ const ProfileRow kProfile[] = {
      .when = {HeaderTest::kStoreDocIs, {"PDReceiptD"}},
      .texts = {{&S::StoreField, "IDReceiverStore"}}},
 };
-
-bool NameIn(const std::string& name, std::initializer_list<std::string_view> names) {
-  for (std::string_view n : names)
-    if (TextEquals(name, n)) return true;
-  return false;
-}
 
 }  // namespace
 
@@ -335,26 +328,27 @@ void FillList(XALSBEproxy& doc, const std::string& field, std::initializer_list<
 
 }  // namespace
 
-// Every profile row that names the document's table and whose header test holds, in order.
+// Every profile row that names the document's table and whose header test holds, in order. What
+// the forms above know is read once, when a row first asks.
 void DocFunc::ApplyProfile() {
-  HeaderInfo header;
-  bool headerRead = false;
+  std::optional<HeaderInfo> header;
+  auto above = [&]() -> const HeaderInfo& {
+    if (!header) header = ReadHeaderInfo(st_.Doc);
+    return *header;
+  };
   for (const ProfileRow& row : kProfile) {
     if (!NameIn(st_.DocTable, row.tables)) continue;
-    if (row.when.kind != HeaderTest::kAlways) {
-      if (!headerRead) header = ReadHeaderInfo(st_.Doc);
-      headerRead = true;
-      if (!HeaderTestHolds(row.when, header)) continue;
-    }
+    if (row.when.kind != HeaderTest::kAlways && !HeaderTestHolds(row.when, above())) continue;
     for (Flag f : row.setTrue) st_.*f = true;
     for (Flag f : row.setFalse) st_.*f = false;
-    for (const auto& [field, value] : row.texts) st_.*field = value == kDocTableValue ? st_.DocTable : std::string(value);
+    for (const auto& [field, value] : row.texts)
+      st_.*field = value == kDocTableValue ? st_.DocTable : std::string(value);
     if (row.assetFields != AssetSide::kNone)
       for (const AssetField& a : kAssetFields)
         st_.*a.field = std::string(row.assetFields == AssetSide::kSender ? a.sender : a.receiver);
     for (const OptionRead& o : row.options) {
       const std::string section = o.section == kSectionDocTable ? st_.DocTable
-                                  : *o.section == '\0'         ? (headerRead ? header.table : ReadHeaderInfo(st_.Doc).table)
+                                  : *o.section == '\0'         ? above().table
                                                                : std::string(o.section);
       TryStep([&] {
         if (const Flag* f = std::get_if<Flag>(&o.target))
@@ -396,7 +390,7 @@ void DocFunc::ApplyClosingSteps() {
   // "Min" over no rows is one row holding Null: the value tells whether any quantity step exists.
   TryStep([&] {
     Ref<DataObject> q = OpenQuery("SELECT Min(ID) AS tmpID FROM GRPriceLQuantity");
-    st_.HasQuantityPrices = !Require(q).IsEOF() && !IsBlank(q->Field("tmpID"));
+    st_.HasQuantityPrices = !q->IsEOF() && !IsBlank(q->Field("tmpID"));
   });
 }
 
@@ -452,13 +446,16 @@ void DocFunc::FillRegisterLists() {
   for (const RegisterList& r : kRegisterLists) {
     if (!TextEquals(st_.DocTable, r.form)) continue;
     TryStep([&] {
-      ValueTexts& list = Require(st_.Doc->ValueLists(std::string(r.list)));
-      ParamList& catalogue = Require(st_.Server->TableCatalogue());
-      if (TextEquals(r.form, "GRDocSeries")) Require(st_.Doc->ValueLists("DocType")).Add(Variant("DRStoreOut"), GetUIString(51));
-      auto add = [&](const std::string& name, const std::string& text) { list.Add(Variant(name), text); };
-      for (int32_t i = 1; i <= catalogue.Count(); ++i) {
-        const std::string name = catalogue.NameAt(i);
-        Variant entry = catalogue.Item(name);
+      Checked<ValueTexts> list = st_.Doc->ValueLists(std::string(r.list));
+      Checked<ParamList> catalogue = st_.Server->TableCatalogue();
+      if (TextEquals(r.form, "GRDocSeries")) {
+        Checked<ValueTexts> types = st_.Doc->ValueLists("DocType");
+        types->Add(Variant("DRStoreOut"), GetUIString(51));
+      }
+      auto add = [&](const std::string& name, const std::string& text) { list->Add(Variant(name), text); };
+      for (int32_t i = 1; i <= catalogue->Count(); ++i) {
+        const std::string name = catalogue->NameAt(i);
+        Variant entry = catalogue->Item(name);
         auto info = std::dynamic_pointer_cast<ParamList>(entry.IsObject() ? entry.AsObject() : nullptr);
         if (!info) continue;
         const std::string caption = HostText(name);

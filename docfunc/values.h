@@ -4,7 +4,9 @@
 #pragma once
 
 #include <cstdint>
+#include <initializer_list>
 #include <string>
+#include <string_view>
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
@@ -23,6 +25,13 @@ inline bool FlagOf(const Variant& v) {
   if (IsBlank(v)) return false;
   if (v.IsString() && Trim(v.AsString()).empty()) return false;
   return CBool(v);
+}
+
+// Whether `name` is one of `names`, in any letter case (table and document names).
+inline bool NameIn(std::string_view name, std::initializer_list<std::string_view> names) {
+  for (std::string_view n : names)
+    if (TextEquals(name, n)) return true;
+  return false;
 }
 
 }  // namespace xal::docfunc
