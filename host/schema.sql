@@ -1041,3 +1041,26 @@ CREATE TRIGGER DDStoreDRow_res_au AFTER UPDATE OF IDGRArticle, IDReceiverStore, 
   INSERT INTO DCurDRStockReserveRefresh
     SELECT DISTINCT IDDRStockReserve FROM DRStockReserveRel WHERE IDDDStoreDRow = NEW.ID;
 END;
+
+-- ---------------------------------------------------------------------------------------------
+-- Columns the header validations fill: the accounts and foreign-trade terms a company brings,
+-- and the row fields that take the company, the department and the registers. Added here apart
+-- until the tables above list them in place.
+-- ---------------------------------------------------------------------------------------------
+ALTER TABLE GDocument ADD COLUMN IDBRAccount INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GDocument ADD COLUMN IDPurchaseAccount INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GDocument ADD COLUMN IDDebtAccount INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GDocument ADD COLUMN IDDRIntrTermDelivery INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GDocument ADD COLUMN IDDRIntrTransport INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GDocument ADD COLUMN IDDRIntrCustomsProc INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GRCompany ADD COLUMN Country TEXT COLLATE NOCASE NOT NULL DEFAULT '';
+ALTER TABLE GRCompany ADD COLUMN DeliveryLocation TEXT COLLATE NOCASE NOT NULL DEFAULT '';
+ALTER TABLE GRCompany ADD COLUMN IDDRIntrTermDelivery INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GRCompany ADD COLUMN IDDRIntrTransport INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE GRCompany ADD COLUMN IDDRIntrCustomsProc INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE SDInvoiceRow ADD COLUMN IDGRCompany INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE SDInvoiceRow ADD COLUMN IDGRDepartment INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE SDInvoiceRow ADD COLUMN IDGARegister2 INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE SDInvoiceRow ADD COLUMN IDGBRegister4 INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE CADocRow ADD COLUMN IDSenderDepartment INTEGER NOT NULL DEFAULT 0;
+ALTER TABLE CADocRow ADD COLUMN IDReceiverDepartment INTEGER NOT NULL DEFAULT 0;

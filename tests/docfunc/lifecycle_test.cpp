@@ -73,7 +73,10 @@ TEST_F(Lifecycle, NewDocumentTakesTheUsersDefaults) {
   EXPECT_EQ(h->Field("DocDate"), Variant(Today()));
   EXPECT_EQ(h->Field("IDEREmployee"), Variant(7));
   EXPECT_EQ(h->Field("IDXALUser"), Variant(1));
-  EXPECT_EQ(session->TranscriptText(), "StatusMsg(\"\"); StatusMsg(\"Missing doc. series\")");
+  // The company is validated as if entered: it clears the status line and shows its panel.
+  EXPECT_EQ(session->TranscriptText(),
+            "StatusMsg(\"\"); StatusMsg(\"Missing doc. series\"); StatusMsg(\"\"); CmdPost(\"ShowGRCompanyInfo\"); "
+            "RefreshHeader(\"\")");
   EXPECT_TRUE(State().NewDocument);
   EXPECT_FALSE(State().NewDocPending);
   EXPECT_EQ(State().RowOB.get(), session->Rows());
@@ -99,7 +102,8 @@ TEST_F(Lifecycle, CopiedDocumentKeepsItsTypeButGetsANewNumberAndDates) {
   EXPECT_EQ(h->Field("DocDate"), Variant(Today()));
   EXPECT_EQ(h->Field("DealDate"), Variant(Today()));
   EXPECT_EQ(h->Field("IDXALUser"), Variant(1));
-  EXPECT_EQ(session->TranscriptText(), "StatusMsg(\"\")");
+  EXPECT_EQ(session->TranscriptText(),
+            "StatusMsg(\"\"); StatusMsg(\"\"); CmdPost(\"ShowGRCompanyInfo\"); RefreshHeader(\"\")");
   EXPECT_TRUE(State().NewDocument);
 }
 
