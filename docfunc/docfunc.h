@@ -116,6 +116,10 @@ class DocFunc : public Object {
 
   // ---- For the host and tests (not in the type library) ----------------------------------------
   const DocState& State() const { return st_; }
+  // The credit-limit check (company.cpp): mode 0 warns when a company is chosen; any other mode
+  // is the save-time check, which asks whether to save. False only when the user declines to save
+  // a document over the limit.
+  bool VerifyCreditLimit(int16_t mode);
 
  private:
   // ---- The handler template (handler.h, handler.cpp) -------------------------------------------
@@ -178,9 +182,6 @@ class DocFunc : public Object {
   void FillFromPartner(int16_t pFill);
   void TakePriceListMode();
   void ResetExchangeRates();
-  // The credit-limit check: mode 0 warns (a company was chosen); any other mode asks whether to
-  // save. False only when the user declines to save a document over the limit.
-  bool VerifyCreditLimit(int16_t mode);
 
   // ---- Lifecycle helpers (lifecycle.cpp) --------------------------------------------------------
   void SetNewDocDefaults();
