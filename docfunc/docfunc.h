@@ -5,7 +5,8 @@
 // W… before it is edited, D… defaults), and commands registered as menu items.
 // Every handler runs through one template (docfunc/handler.h): errors end the handler, are shown
 // in the status line and never reach the script; refreshes and totals are deferred to the
-// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp.
+// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp,
+// prices.cpp, header_fields.cpp with company.cpp and propagation.cpp.
 // Ownership: the object holds Refs to the proxy, the data objects, the connection and the server
 // until Destroy releases them; the host keeps its own references.
 #pragma once

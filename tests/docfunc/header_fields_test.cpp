@@ -25,6 +25,7 @@ class HeaderFields : public DocFuncTest {
 
 TEST_F(HeaderFields, DatesAgainstClosedPeriodsAndTheLimit) {
   const double today = Today().serial;
+  const std::string kAsk = "MsgBox(\"Document date outside allowed date range. Do you want to proceed?\",4)->";
   struct Case {
     const char* handler;
     double date, closedUpTo, promptDate;
@@ -36,10 +37,8 @@ TEST_F(HeaderFields, DatesAgainstClosedPeriodsAndTheLimit) {
       {"VDocDate", 39876, 39877, 0, 0, false, "StatusMsg(\"Err_DocInClosedPeriod\")"},
       {"VDocDate", 39876, 0, 0, 0, true, "StatusMsg(\"\"); RefreshHeader(\"\")"},  // 0: nothing closed
       {"VDocDate", 0, 0, 0, 0, false, "StatusMsg(\"Err_DocDateMissing\")"},
-      {"VDocDate", today + 1, 0, 0, 7, false, "MsgBox(\"Document date outside allowed date range. Do you want to "
-                                              "proceed?\",4)->7"},
-      {"VDocDate", -3, 0, 0, 6, true, "MsgBox(\"Document date outside allowed date range. Do you want to "
-                                      "proceed?\",4)->6; StatusMsg(\"\"); RefreshHeader(\"\")"},  // before 1900
+      {"VDocDate", today + 1, 0, 0, 7, false, kAsk + "7"},
+      {"VDocDate", -3, 0, 0, 6, true, kAsk + "6; StatusMsg(\"\"); RefreshHeader(\"\")"},  // before 1900
       {"VDocDate", 39880, 0, 39870, 0, false, "StatusMsg(\"Due date earlier than document date\")"},
       {"VDealDate", 39876, 39877, 0, 0, false, "StatusMsg(\"Err_DealDateOutOfRange\")"},
       {"VDealDate", 39877.75, 39877, 0, 0, true, "StatusMsg(\"\")"},
@@ -81,6 +80,52 @@ TEST_F(HeaderFields, ReferenceNumberCheckDigit) {
     EXPECT_EQ(Handler("VReferenceNo"), Variant(c.result));
     EXPECT_EQ(session->TranscriptText(), c.transcript);
   }
+}
+
+TEST_F(HeaderFields, TermsGiveTheDueAndDeliveryDatesAndTheRowsTakeThem) {
+  Sql("INSERT INTO GRTermPaymentRow (IDGRTermPayment, PromptTime, PenaltyPercent) VALUES (20, 10, 0.1), (20, 30, 0.05);"
+      "INSERT INTO GRTermDelivery (ID, DeliveryTime) VALUES (5, 7);");
+  Open("SDInvoice");
+  AddRow({{"IDGRArticle", Variant(1)}});
+  SetHeader({{"DocDate", Variant(Date(39877))}, {"IDGRTermPayment", Variant(20)}, {"IDGRTermDelivery", Variant(5)},
+             {"Country", Variant("LV")}});
+  for (const char* handler : {"VTermPayment", "VTermDelivery", "VDeliveryDate", "VCountry"})
+    EXPECT_EQ(Handler(handler), Variant(true)) << handler;
+  EXPECT_EQ(HeaderField("PromptDate"), Variant(Date(39907)));  // the longest prompt time
+  EXPECT_EQ(HeaderField("PenaltyPercent"), Variant(0.05));
+  EXPECT_EQ(session->Rows()->Field("DeliveryDate"), Variant(Date(39884)));
+  EXPECT_EQ(session->Rows()->Field("Country"), Variant("LV"));
+  SetHeader({{"PromptDate", Variant(Date(39876))}});
+  EXPECT_EQ(Handler("VPromptDate"), Variant(false));
+}
+
+// The partner's name follows the company's when blank or the same company; on the purchase side
+// the reference number is the supplier's first that is not blank; the deal state names type and series.
+TEST_F(HeaderFields, SmallFills) {
+  struct Case {
+    int32_t partner;
+    const char* before;
+    const char* after;
+  } cases[] = {{10, "Old", "Acme Ltd"}, {11, " ", "Acme Ltd"}, {11, "Other", "Other"}};
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.before);
+    Open("SDInvoice");
+    SetHeader({{"IDGRCompany", Variant(10)}, {"IDPartner", Variant(c.partner)}, {"CompanyName", Variant(" Acme Ltd ")},
+               {"PartnerName", Variant(c.before)}});
+    EXPECT_EQ(Handler("VCompanyName"), Variant(true));
+    EXPECT_EQ(HeaderField("PartnerName"), Variant(c.after));
+  }
+  Sql("UPDATE GRCompany SET ReferenceNo = '13' WHERE ID = 10; UPDATE GRCompany SET ReferenceNo = ' ' WHERE ID = 11;"
+      "INSERT INTO GRBankAccount (ID, IDGRCompany, ReferenceNo) VALUES (41, 11, '');");
+  SetOption("PDInvoice", "PGRDocType", Variant(3));
+  Open("PDInvoice");
+  SetHeader({{"IDGRCompany", Variant(10)}, {"IDPartner", Variant(11)}, {"IDPartnerBAcc", Variant(41)},
+             {"DealState", Variant(" P")}});
+  EXPECT_EQ(Handler("VGRBankAccount"), Variant(true));
+  EXPECT_EQ(Handler("VDealState"), Variant(true));
+  EXPECT_EQ(HeaderField("ReferenceNo"), Variant("13"));
+  EXPECT_EQ(HeaderField("IDGRDocType"), Variant(3));
+  EXPECT_EQ(HeaderField("IDGRDocSeries"), Variant(0));
 }
 
 // A stored invoice with a set row (two components) and a plain row.
