@@ -126,6 +126,15 @@ TEST_F(HeaderFields, SmallFills) {
   EXPECT_EQ(HeaderField("ReferenceNo"), Variant("13"));
   EXPECT_EQ(HeaderField("IDGRDocType"), Variant(3));
   EXPECT_EQ(HeaderField("IDGRDocSeries"), Variant(0));
+  // A new series draws a new number; a new currency has its rates looked up again.
+  SetHeader({{"DocNo", Variant(12)}, {"ExchangeRate", Variant(1.5)}, {"ExchangeRateRef", Variant(2.5)}});
+  session->ClearTranscript();
+  EXPECT_EQ(Handler("VGRDocSeries"), Variant(true));
+  EXPECT_EQ(Handler("VGRCurrency"), Variant(true));
+  EXPECT_EQ(session->TranscriptText(), "RefreshHeader(\"DocNo\"); RefreshHeader(\"\")");
+  EXPECT_EQ(HeaderField("DocNo"), Variant(0));
+  EXPECT_EQ(HeaderField("ExchangeRate"), Variant(0.0));
+  EXPECT_EQ(HeaderField("ExchangeRateRef"), Variant(0.0));
 }
 
 // A stored invoice with a set row (two components) and a plain row.
