@@ -6,7 +6,8 @@
 // Every handler runs through one template (docfunc/handler.h): errors end the handler, are shown
 // in the status line and never reach the script; refreshes and totals are deferred to the
 // outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp,
-// quantities.cpp, taxes.cpp, totals.cpp, prices.cpp.
+// quantities.cpp, taxes.cpp, totals.cpp, prices.cpp, header_fields.cpp with company.cpp and
+// propagation.cpp.
 // Ownership: the object holds Refs to the proxy, the data objects, the connection and the server
 // until Destroy releases them; the host keeps its own references.
 #pragma once
@@ -91,8 +92,37 @@ class DocFunc : public Object {
   bool ComputePercentAmount();
   bool ComputePercentPricelist();
 
+  // ---- Header field validations (header_fields.cpp, company.cpp) --------------------------------
+  bool VDealState();
+  bool VGRDocSeries();
+  bool VReferenceNo();
+  bool VDocDate();
+  bool VDealDate();
+  bool VTermPayment();
+  bool VPromptDate();
+  bool VTermDelivery();
+  bool VDeliveryDate();
+  bool VCountry();
+  bool VGRDepartment();
+  bool VWorker();
+  bool VGRProject();
+  bool VRegisters();
+  bool VGRBankAccount();
+  bool VGRCurrency();
+  bool VCode();
+  bool VCompanyName();
+  bool VCompanyAddr();
+  bool VGRCompany();
+  // pFill 0: names, address and bank account only; 1: the partner's values override the
+  // company's; 2: they fill only what the company leaves empty.
+  bool VPartner(int16_t pFill = 1);
+
   // ---- For the host and tests (not in the type library) ----------------------------------------
   const DocState& State() const { return st_; }
+  // The credit-limit check (company.cpp): mode 0 warns when a company is chosen; any other mode
+  // is the save-time check, which asks whether to save. False only when the user declines to save
+  // a document over the limit.
+  bool VerifyCreditLimit(int16_t mode);
 
  private:
   // ---- The handler template (handler.h, handler.cpp) -------------------------------------------
@@ -135,6 +165,26 @@ class DocFunc : public Object {
   void FillValueLists();
   void FillRegisterLists();
   void BindRowForm();
+
+  // ---- Header validations (propagation.cpp, header_fields.cpp, company.cpp) --------------------
+  // Whether rows are bound and hold at least one row.
+  bool HasRows();
+  // Writes `value` into `field` of every row, the component rows of a set row first.
+  void PropagateToRows(const std::string& field, const Variant& value);
+  // The register question: the header's `headerField` carried into the rows' `rowField` when the
+  // user agrees; `noun` is the UI text that names the registers in the question.
+  void CarryRegisterToRows(const std::string& headerField, int32_t noun, const std::string& rowField);
+  // Steps 1-4 of the date validation on the header's `field`; False when the date is refused.
+  bool DateAccepted(const std::string& field, const std::string& missingKey, const std::string& closedKey);
+  // Shows a company's message; True when its marker refuses the company on this kind.
+  bool ShowCompanyMessage(const std::string& field);
+  bool CheckCompanyChange();
+  void FillFromCompany(int32_t company);
+  void RefillFromCompany();
+  int32_t SavedPriceCategory();
+  void FillFromPartner(int16_t pFill);
+  void TakePriceListMode();
+  void ResetExchangeRates();
 
   // ---- Lifecycle helpers (lifecycle.cpp) --------------------------------------------------------
   void SetNewDocDefaults();

@@ -20,6 +20,7 @@ inline double DoubleOf(const Variant& v) { return IsBlank(v) ? 0.0 : CDbl(v); }
 inline Currency CurrencyOf(const Variant& v) { return IsBlank(v) ? Currency() : CCur(v); }
 inline std::string TextOf(const Variant& v) { return IsBlank(v) ? std::string() : CStr(v); }
 inline std::string TrimmedOf(const Variant& v) { return Trim(TextOf(v)); }
+inline Date DateOf(const Variant& v) { return IsBlank(v) ? Date() : CDate(v); }
 // An option or flag: True for a non-zero number, True or numeric text; "" and blanks are False.
 inline bool FlagOf(const Variant& v) {
   if (IsBlank(v)) return false;

@@ -1,6 +1,7 @@
 // Type-library entry of DocFunc: the creatable document-logic object, one line per member in
 // interface order — the three host objects as properties (read, assigned, assigned by
-// reference), then the lifecycle handlers, then the amount, quantity and tax handlers, then prices and discounts.
+// reference), then the lifecycle handlers, then the amount, quantity and tax handlers, then
+// prices and discounts, then the header field validations.
 #include "docfunc/docfunc.h"
 #include "runtime/binding.h"
 
@@ -60,7 +61,28 @@ void RegisterDocFunc() {
       .Method<&D::VDiscount>("VDiscount")
       .Method<&D::FillPrice>("FillPrice", {Param("pRowOB")})
       .Method<&D::ComputePercentAmount>("ComputePercentAmount")
-      .Method<&D::ComputePercentPricelist>("ComputePercentPricelist");
+      .Method<&D::ComputePercentPricelist>("ComputePercentPricelist")
+      .Method<&D::VDealState>("VDealState")
+      .Method<&D::VGRDocSeries>("VGRDocSeries")
+      .Method<&D::VReferenceNo>("VReferenceNo")
+      .Method<&D::VDocDate>("VDocDate")
+      .Method<&D::VDealDate>("VDealDate")
+      .Method<&D::VTermPayment>("VTermPayment")
+      .Method<&D::VPromptDate>("VPromptDate")
+      .Method<&D::VTermDelivery>("VTermDelivery")
+      .Method<&D::VDeliveryDate>("VDeliveryDate")
+      .Method<&D::VCountry>("VCountry")
+      .Method<&D::VGRDepartment>("VGRDepartment")
+      .Method<&D::VWorker>("VWorker")
+      .Method<&D::VGRProject>("VGRProject")
+      .Method<&D::VRegisters>("VRegisters")
+      .Method<&D::VGRBankAccount>("VGRBankAccount")
+      .Method<&D::VGRCurrency>("VGRCurrency")
+      .Method<&D::VCode>("VCode")
+      .Method<&D::VCompanyName>("VCompanyName")
+      .Method<&D::VCompanyAddr>("VCompanyAddr")
+      .Method<&D::VGRCompany>("VGRCompany")
+      .Method<&D::VPartner>("VPartner", {Def("pFill", Variant(int16_t{1}))});
 }
 
 const bool kRegistered = (RegisterDocFunc(), true);

@@ -66,8 +66,10 @@ TEST_F(Lifecycle, NewDocumentTakesTheUsersDefaults) {
                     {"IDGRTax", Variant(2)}, {"IDGARegister4", Variant(44)}, {"IDGRDepartment", Variant(5)},
                     {"IsApproximated", Variant(true)}, {"DocDate", Variant(Today())}, {"IDEREmployee", Variant(7)},
                     {"IDXALUser", Variant(1)}});
-  EXPECT_EQ(session->TranscriptText(),  // the totals built by WhenDocument
-            "StatusMsg(\"\"); StatusMsg(\"Missing doc. series\"); RefreshHeader(\"@\"); RefreshHeader(\"TotalAmount\")");
+  // The company is validated as if entered: it clears the status line and shows its panel.
+  EXPECT_EQ(session->TranscriptText(),
+            "StatusMsg(\"\"); StatusMsg(\"Missing doc. series\"); StatusMsg(\"\"); CmdPost(\"ShowGRCompanyInfo\"); "
+            "RefreshHeader(\"\")");
   EXPECT_TRUE(State().NewDocument);
   EXPECT_FALSE(State().NewDocPending);
   EXPECT_EQ(State().RowOB.get(), session->Rows());
@@ -87,7 +89,8 @@ TEST_F(Lifecycle, CopiedDocumentKeepsItsTypeButGetsANewNumberAndDates) {
                     {"IDOwner", Variant::Null()},  // no defaults on a copy
                     {"DocNo", Variant(0)}, {"SourceDocNo", Variant("")}, {"DocState", Variant("")},
                     {"DocDate", Variant(Today())}, {"DealDate", Variant(Today())}, {"IDXALUser", Variant(1)}});
-  EXPECT_EQ(session->TranscriptText(), "StatusMsg(\"\")");
+  EXPECT_EQ(session->TranscriptText(),
+            "StatusMsg(\"\"); StatusMsg(\"\"); CmdPost(\"ShowGRCompanyInfo\"); RefreshHeader(\"\")");
   EXPECT_TRUE(State().NewDocument);
 }
 
