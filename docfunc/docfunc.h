@@ -5,7 +5,8 @@
 // W… before it is edited, D… defaults), and commands registered as menu items.
 // Every handler runs through one template (docfunc/handler.h): errors end the handler, are shown
 // in the status line and never reach the script; refreshes and totals are deferred to the
-// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp.
+// outermost handler. The bodies are split by topic: lifecycle.cpp, profile.cpp, amounts.cpp,
+// prices.cpp.
 // Ownership: the object holds Refs to the proxy, the data objects, the connection and the server
 // until Destroy releases them; the host keeps its own references.
 #pragma once
@@ -154,6 +155,26 @@ class DocFunc : public Object {
   void InitialTotals(const StoredTaxes& taxes);
   // The quantity `quantity` of unit `unit` in unit `baseUnit`, through the units' relations.
   double UnitToBase(double quantity, int32_t unit, int32_t baseUnit);
+
+  // ---- Prices (prices.cpp) ----------------------------------------------------------------------
+  // The price look-up for an article: fills CompanyPriceRow, PriceListRow and the look-up flags.
+  void LookUpPrice(int32_t article);
+  Date PriceDate();
+  Ref<xal::DataObject> CompanyPrice(int32_t article, int32_t company, Date date);
+  int32_t OrdinaryPriceList(int32_t article);
+  // The first price row valid on `date` in the chain from `list`; nullptr when there is none.
+  Ref<xal::DataObject> PriceRowInChain(int32_t article, int32_t list, Date date);
+  int32_t PriceListOnDate(int32_t list, Date date, int32_t& next);
+  // How many of the article's unit one price unit holds.
+  double UnitFactor(int32_t articleUnit, int32_t priceUnit);
+  void FillCompanyPrice(xal::DataObject& row);
+  void FillListPrice(xal::DataObject& row);
+  bool KeepsAmount(xal::DataObject& row);
+  void DiscountRow(Ref<xal::DataObject>& row);
+  void RederivePrice(xal::DataObject& row);
+  bool ComputePercent(int32_t title, bool fromPriceList);
+  void ChangeByPercent(xal::DataObject& row, double factor, bool fromPriceList);
+  double CategoryCut(xal::DataObject& row);
 
   DocState st_;
 };
