@@ -67,11 +67,12 @@ bool DocFunc::VPriceList(bool pAsk) {
   return Handle("VPriceList", [&](bool& result) {
     DataObject& header = *st_.HeaderOB;
     const int32_t list = LongOf(header.Field(st_.PriceListField));
-    st_.PriceListID = list;
     if (list == 0) {
+      st_.PriceListID = 0;
       header.SetField("PriceList", Variant(""));
       header.SetField("PriceCut", Variant(0.0));
     } else if (!IsBlank(header.Field("GRPriceList.ID"))) {
+      st_.PriceListID = list;
       header.SetField("PriceList", Variant(TextOf(header.Field("GRPriceList.Name"))));
       st_.PriceIsGross = FlagOf(header.Field("GRPriceList.IsBruto"));
       st_.PriceNoCut = FlagOf(header.Field("GRPriceList.WithoutPriceCut"));

@@ -83,20 +83,17 @@ class PricesTest : public DialectDbTest {
     df->Create();
     df->SetRowOB(rows);
   }
-  void AddRow(int32_t article, double quantity, int32_t tax = 0) {
-    rows->AddNew();
-    rows->SetField("IDGRArticle", Variant(article));
-    rows->SetField("BaseQuantity", Variant(quantity));
-    rows->SetField("IDGRTax", Variant(tax));
+  // A row (or a particular of `to`) with its list unit price, amount and base quantity.
+  void AddRow(int32_t article, double unitPrice, double amount, double quantity, Ref<DataObject> to = nullptr) {
+    DataObject& r = to ? *to : *rows;
+    r.AddNew();
+    r.SetField("IDGRArticle", Variant(article));
+    r.SetField("UnitPrice", Variant(unitPrice));
+    r.SetField("Amount", Variant(amount));
+    r.SetField("BaseQuantity", Variant(quantity));
+    r.SetField("Price", Variant(amount / quantity));
   }
-  void SetPrices(double unitPrice, double amount, double quantity) {
-    rows->SetField("UnitPrice", Variant(CCur(Variant(unitPrice))));
-    rows->SetField("Amount", Variant(CCur(Variant(amount))));
-    rows->SetField("BaseQuantity", Variant(quantity));
-    rows->SetField("Price", Variant(CCur(Variant(amount / quantity))));
-    rows->SetField("StatAmount", Variant(CCur(Variant(amount))));
-  }
-  std::vector<std::string> MsgBoxes() const {
+  std::vector<std::string> Boxes() const {
     std::vector<std::string> out;
     for (const auto& line : session->Transcript())
       if (line.rfind("MsgBox", 0) == 0 || line.rfind("InputBox", 0) == 0) out.push_back(line);
@@ -107,6 +104,7 @@ class PricesTest : public DialectDbTest {
     const auto& t = session->Transcript();
     return std::any_of(t.begin(), t.end(), [&](const std::string& l) { return TextEquals(l, line); });
   }
+  double Field(const Ref<DataObject>& r, const char* name) { return Dbl(r->Field(name)); }
 
   Ref<host::DocumentSession> session;
   Ref<DataObject> header, rows;
@@ -114,39 +112,40 @@ class PricesTest : public DialectDbTest {
 };
 
 TEST_P(PricesTest, FillPrice) {
+  // Flags: C company price, O own list, Q quantity step, G gross list, N list without cuts.
   struct Row {
     int32_t company, partner, list, article;
     double quantity;
     int32_t tax;
     double unitPrice, price;
     int32_t listID, cListID;
-    bool companyPrice, companyList, quantityPrice, gross;
+    const char* flags;
     const char* why;
   } cases[] = {
-      {100, 0, 11, 1, 2, 0, 30, 30, 13, 0, false, false, false, false, "lists 11, 12 out of date: the third list"},
-      {100, 0, 11, 7, 2, 0, 55, 55, 15, 0, false, false, false, false, "no price in 13, 14: on to 15"},
-      {100, 0, 20, 2, 1, 1, 100, 122, 20, 0, false, false, false, true, "gross 122 with tax 22: net 100"},
-      {100, 0, 20, 2, 1, 0, 122, 122, 20, 0, false, false, false, true, "gross without a tax code"},
-      {100, 0, 30, 3, 20, 0, 180, 200, 30, 0, false, false, true, false, "step with price 0 and -10 %"},
-      {100, 0, 30, 3, 60, 0, 150, 200, 30, 0, false, false, true, false, "the highest step reached wins"},
-      {100, 0, 30, 3, 10, 0, 180, 200, 30, 0, false, false, true, false, "the step's own quantity counts"},
-      {100, 0, 30, 3, 5, 0, 200, 200, 30, 0, false, false, false, false, "below every step: the list price"},
-      {100, 0, 30, 6, 5, 0, 3.6, 3.6, 30, 0, false, false, false, false, "price per pack of 10: per piece"},
-      {100, 0, 30, 4, 1, 0, 80, 80, 0, 1, true, false, false, false, "company price beats the list's 100"},
-      {102, 100, 30, 4, 1, 0, 80, 80, 0, 1, true, false, false, false, "the partner's company price"},
-      {101, 0, 30, 1, 1, 0, 25, 25, 40, 0, false, true, false, false, "the company's own list"},
-      {101, 0, 11, 7, 1, 0, 55, 55, 15, 0, false, false, false, false, "own list without the article"},
-      {103, 0, 30, 3, 1, 0, 200, 200, 30, 0, false, false, false, false, "own list out of date"},
-      {102, 0, 0, 5, 1, 0, 70, 70, 50, 0, false, false, false, false, "no header list: the category's"},
-      {100, 102, 0, 5, 1, 0, 70, 70, 50, 0, false, false, false, false, "the partner's category"},
-      {100, 0, 0, 5, 1, 0, 0, 0, 0, 0, false, false, false, false, "no list and no category"},
-      {100, 0, 60, 1, 1, 0, 0, 0, 0, 0, false, false, false, false, "A -> B -> A ends"},
-      {100, 0, 62, 1, 1, 0, 0, 0, 0, 0, false, false, false, false, "a cycle of lists out of date ends"},
-      {100, 0, 999, 1, 1, 0, 0, 0, 0, 0, false, false, false, false, "a list id naming no list"},
-      {999, 998, 30, 999, 1, 0, 0, 0, 0, 0, false, false, false, false, "no such company, partner, article"},
+      {100, 0, 11, 1, 2, 0, 30, 30, 13, 0, "N", "lists 11, 12 out of date: the third list, its flags"},
+      {100, 0, 11, 7, 2, 0, 55, 55, 15, 0, "", "no price in 13, 14: on to 15"},
+      {100, 0, 20, 2, 1, 1, 100, 122, 20, 0, "G", "gross 122 with tax 22: net 100"},
+      {100, 0, 20, 2, 1, 0, 122, 122, 20, 0, "G", "gross without a tax code"},
+      {100, 0, 30, 3, 20, 0, 180, 200, 30, 0, "Q", "step with price 0 and -10 %"},
+      {100, 0, 30, 3, 60, 0, 150, 200, 30, 0, "Q", "the highest step reached wins"},
+      {100, 0, 30, 3, 10, 0, 180, 200, 30, 0, "Q", "the step's own quantity counts"},
+      {100, 0, 30, 3, 5, 0, 200, 200, 30, 0, "", "below every step: the list price"},
+      {100, 0, 30, 6, 5, 0, 3.6, 3.6, 30, 0, "", "price per pack of 10: per piece"},
+      {100, 0, 30, 4, 1, 0, 80, 80, 0, 1, "C", "company price beats the list's 100"},
+      {102, 100, 30, 4, 1, 0, 80, 80, 0, 1, "C", "the partner's company price"},
+      {101, 0, 30, 1, 1, 0, 25, 25, 40, 0, "O", "the company's own list"},
+      {101, 0, 11, 7, 1, 0, 55, 55, 15, 0, "", "own list without the article"},
+      {103, 0, 30, 3, 1, 0, 200, 200, 30, 0, "", "own list out of date"},
+      {102, 0, 0, 5, 1, 0, 70, 70, 50, 0, "", "no header list: the category's"},
+      {100, 102, 0, 5, 1, 0, 70, 70, 50, 0, "", "the partner's category"},
+      {100, 0, 0, 5, 1, 0, 0, 0, 0, 0, "", "no list and no category"},
+      {100, 0, 60, 1, 1, 0, 0, 0, 0, 0, "", "A -> B -> A ends"},
+      {100, 0, 62, 1, 1, 0, 0, 0, 0, 0, "", "a cycle of lists out of date ends"},
+      {100, 0, 999, 1, 1, 0, 0, 0, 0, 0, "", "a list id naming no list"},
+      {999, 998, 30, 999, 1, 0, 0, 0, 0, 0, "", "no such company, partner, article"},
   };
   Open();
-  AddRow(1, 1);
+  AddRow(1, 9, 9, 1);
   for (const auto& c : cases) {
     SCOPED_TRACE(c.why);
     header->SetField("IDGRCompany", Variant(c.company));
@@ -155,7 +154,6 @@ TEST_P(PricesTest, FillPrice) {
     rows->SetField("IDGRArticle", Variant(c.article));
     rows->SetField("BaseQuantity", Variant(c.quantity));
     rows->SetField("IDGRTax", Variant(c.tax));
-    rows->SetField("UnitPrice", Variant(9));
     rows->SetField("IDGRCPriceList", Variant(9));
     EXPECT_TRUE(df->FillPrice(rows));
     EXPECT_EQ(rows->Field("UnitPrice"), Variant(CCur(Variant(c.unitPrice))));
@@ -163,33 +161,17 @@ TEST_P(PricesTest, FillPrice) {
     EXPECT_EQ(rows->Field("IDGRPriceList"), Variant(c.listID));
     EXPECT_EQ(rows->Field("IDGRCPriceList"), Variant(c.cListID));
     const DocState& st = df->State();
-    EXPECT_EQ(st.CompanyPriceFound, c.companyPrice);
-    EXPECT_EQ(st.CompanyListUsed, c.companyList);
-    EXPECT_EQ(st.QuantityPriceUsed, c.quantityPrice);
-    if (c.listID != 0) {
-      EXPECT_EQ(st.PriceIsGross, c.gross);
-    }
+    std::string flags = std::string(st.CompanyPriceFound ? "C" : "") + (st.CompanyListUsed ? "O" : "") +
+                        (st.QuantityPriceUsed ? "Q" : "");
+    if (c.listID != 0) flags += std::string(st.PriceIsGross ? "G" : "") + (st.PriceNoCut ? "N" : "");
+    EXPECT_EQ(flags, c.flags);
   }
   EXPECT_EQ(session->TranscriptText(), "");  // no error reached the status line
 }
 
-// The flags come from the list the price was found in, not from the list the chain started at.
-TEST_P(PricesTest, FlagsOfTheListUsed) {
-  Open();
-  AddRow(1, 1);
-  header->SetField("IDGRPriceList", Variant(11));
-  df->FillPrice(rows);
-  EXPECT_TRUE(df->State().PriceNoCut);  // list 13 is without price cut, 11 is not
-  header->SetField("IDGRPriceList", Variant(20));
-  rows->SetField("IDGRArticle", Variant(2));
-  df->FillPrice(rows);
-  EXPECT_FALSE(df->State().PriceNoCut);
-  EXPECT_TRUE(df->State().PriceIsGross);
-}
-
 TEST_P(PricesTest, SqlOfOneLookUp) {
   Open();
-  AddRow(1, 2);
+  AddRow(1, 0, 0, 2);
   header->SetField("IDGRCompany", Variant(100));
   header->SetField("IDGRPriceList", Variant(11));
   conn->Clear();
@@ -213,48 +195,45 @@ TEST_P(PricesTest, SqlOfOneLookUp) {
 // A document kind without prices looks nothing up and leaves the four price fields 0.
 TEST_P(PricesTest, NoPriceList) {
   Open("DDMovement");
-  AddRow(3, 20);
+  AddRow(3, 7, 7, 20);
   header->SetField("IDGRPriceList", Variant(30));
-  for (const char* f : {"UnitPrice", "Price", "IDGRPriceList", "IDGRCPriceList"}) rows->SetField(f, Variant(7));
   conn->Clear();
   EXPECT_TRUE(df->FillPrice(rows));
-  for (const char* f : {"UnitPrice", "Price", "IDGRPriceList", "IDGRCPriceList"}) EXPECT_EQ(Dbl(rows->Field(f)), 0) << f;
+  for (const char* f : {"UnitPrice", "Price", "IDGRPriceList", "IDGRCPriceList"}) EXPECT_EQ(Field(rows, f), 0) << f;
   EXPECT_EQ(conn->Sql(), (std::vector<std::string>{"SELECT * FROM GRPriceListRel WHERE 1=0",
                                                     "SELECT * FROM GRCPriceListRel WHERE 1=0"}));
 }
 
+// Each case asks (or not) once; a second call without asking repeats that answer silently.
 TEST_P(PricesTest, PriceCutQuestion) {
   struct Row {
     const char* option;  // the user's "AskCompany"
-    bool rows, ask, before;
+    bool rows;
     int32_t answer;
     std::vector<std::string> boxes;
-    bool after;
+    bool recompute;
   } cases[] = {
-      {"", false, true, false, 7, {}, false},  // without rows nothing is asked or changed
-      {"", true, true, true, 7, {"MsgBox(\"Recompute row amounts?\",4)->7"}, false},
-      {"", true, true, false, 6, {"MsgBox(\"Recompute row amounts?\",4)->6"}, true},
-      {"AlwaysYes", true, true, false, 7, {}, true},
-      {"alwaysno", true, true, true, 6, {}, false},
-      {" AlwaysNo ", true, true, true, 6, {}, false},
-      {"", true, false, true, 7, {}, true},  // not asking repeats the last answer
-      {"", true, false, false, 6, {}, false},
+      {"", false, 6, {}, false},  // without rows nothing is asked or changed
+      {"", true, 7, {"MsgBox(\"Recompute row amounts?\",4)->7"}, false},
+      {"", true, 6, {"MsgBox(\"Recompute row amounts?\",4)->6"}, true},
+      {"AlwaysYes", true, 7, {}, true},
+      {"alwaysno", true, 6, {}, false},
+      {" AlwaysNo ", true, 6, {}, false},
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(std::string("option '") + c.option + "'");
     host->SetUserOption(host->UserID(), "SDInvoice", "AskCompany", Variant(c.option));
     Open();
-    if (c.rows) AddRow(1, 1);
-    session->Policy().msgBoxAnswers = {c.answer};
-    // The last answer, as a previous question left it.
-    host->SetUserOption(host->UserID(), "SDInvoice", "AskCompany", Variant(c.before ? "AlwaysYes" : "AlwaysNo"));
-    if (c.rows) df->VPriceCut(true);
-    host->SetUserOption(host->UserID(), "SDInvoice", "AskCompany", Variant(c.option));
+    if (c.rows) AddRow(1, 0, 0, 1);
     session->ClearTranscript();
-    EXPECT_TRUE(df->VPriceCut(c.ask));
-    EXPECT_EQ(MsgBoxes(), c.boxes);
-    EXPECT_EQ(df->State().RecalcRowsAnswer, c.after);
+    session->Policy().msgBoxAnswers = {c.answer, c.recompute ? 7 : 6};
+    EXPECT_TRUE(df->VPriceCut(true));
+    EXPECT_EQ(Boxes(), c.boxes);
+    EXPECT_EQ(df->State().RecalcRowsAnswer, c.recompute);
     EXPECT_EQ(Transcribed("RefreshBrowser(\"SDInvoiceRow.@\")"), c.rows);
+    EXPECT_TRUE(df->VPriceCut(false));
+    EXPECT_EQ(Boxes(), c.boxes);
+    EXPECT_EQ(df->State().RecalcRowsAnswer, c.recompute);
     session->Close();
   }
 }
@@ -268,143 +247,123 @@ TEST_P(PricesTest, HeaderPriceList) {
   EXPECT_EQ(header->Field("PriceList"), Variant("Gross"));
   EXPECT_TRUE(df->State().PriceIsGross);
   EXPECT_EQ(df->State().PriceListID, 20);
-  EXPECT_EQ(Dbl(header->Field("PriceCut")), -5);
+  EXPECT_EQ(Field(header, "PriceCut"), -5);
   EXPECT_TRUE(df->WPriceCut());
   EXPECT_EQ(session->TranscriptText(), "RefreshHeader(\"\")");  // no rows: no question
 
   header->SetField("IDGRPriceList", Variant(999));  // names no list: nothing changes
   EXPECT_TRUE(df->VPriceList(true));
   EXPECT_EQ(header->Field("PriceList"), Variant("Gross"));
-  EXPECT_EQ(Dbl(header->Field("PriceCut")), -5);
+  EXPECT_EQ(Field(header, "PriceCut"), -5);
+  EXPECT_EQ(df->State().PriceListID, 20);
 
   header->SetField("IDGRPriceList", Variant(0));
   EXPECT_TRUE(df->VPriceList(true));
   EXPECT_EQ(header->Field("PriceList"), Variant(""));
-  EXPECT_EQ(Dbl(header->Field("PriceCut")), 0);
+  EXPECT_EQ(Field(header, "PriceCut"), 0);
   EXPECT_FALSE(df->WPriceCut());
 }
 
 TEST_P(PricesTest, Discount) {
   struct Row {
-    double unitPrice, amount, quantity;
+    double unitPrice;
     Variant discount, compType;
-    double expectedAmount, expectedPrice;
+    double amount, price;
     const char* why;
   } cases[] = {
-      {100, 300, 3, Variant(10), Variant(), 270, 90, "10 % off the list price"},
-      {10, 30, 3, Variant(33.33), Variant(), 20.00, 6.6667, "price to 4 decimals, amount to 2"},
-      {100, 300, 3, Variant("5"), Variant(), 285, 95, "a discount typed as text"},
-      {0, 30, 3, Variant(10), Variant(), 30, 10, "no list price: the amount stays"},
-      {100, 300, 3, Variant(10), Variant("C"), 300, 100, "part of a set priced as a whole"},
+      {100, Variant(10), Variant(), 270, 90, "10 % off the list price"},
+      {10, Variant(33.33), Variant(), 20.00, 6.6667, "price to 4 decimals, amount to 2"},
+      {100, Variant("5"), Variant(), 285, 95, "a discount typed as text"},
+      {0, Variant(10), Variant(), 300, 100, "no list price: the amount stays"},
+      {100, Variant(10), Variant("C"), 300, 100, "part of a set priced as a whole"},
   };
   Open();
-  AddRow(1, 1);
   for (const auto& c : cases) {
     SCOPED_TRACE(c.why);
-    SetPrices(c.unitPrice, c.amount, c.quantity);
+    AddRow(1, c.unitPrice, 300, 3);
+    rows->SetField("StatAmount", Variant(300));
     rows->SetField("@Discount", c.discount);
     rows->SetField("@CompType", c.compType);
-    rows->SetField("@DiscountOK", Variant(false));
     EXPECT_TRUE(df->VDiscount());
-    EXPECT_EQ(rows->Field("Amount"), Variant(CCur(Variant(c.expectedAmount))));
-    EXPECT_EQ(rows->Field("Price"), Variant(CCur(Variant(c.expectedPrice))));
+    EXPECT_EQ(rows->Field("Amount"), Variant(CCur(Variant(c.amount))));
+    EXPECT_EQ(rows->Field("Price"), Variant(CCur(Variant(c.price))));
     EXPECT_EQ(rows->Field("StatAmount"), rows->Field("Amount"));
     EXPECT_EQ(rows->Field("@DiscountOK"), Variant(true));
   }
-}
-
-// A set shown by its particulars passes the discount on and adds up their amounts.
-TEST_P(PricesTest, DiscountOfASet) {
-  Open();
-  AddRow(1, 1);
+  // A set shown by its particulars passes the discount on and adds up their amounts.
+  AddRow(1, 0, 0, 1);
   rows->SetField("CompletionType", Variant("D"));
   rows->SetField("@Discount", Variant(10));
   Ref<DataObject> parts = session->Proxy()->CachedRows("SDInvoiceRow", "Next");
-  for (auto [u, q] : {std::pair{10.0, 2.0}, std::pair{5.0, 4.0}}) {
-    parts->AddNew();
-    parts->SetField("UnitPrice", Variant(u));
-    parts->SetField("BaseQuantity", Variant(q));
-  }
+  AddRow(1, 10, 0, 2, parts);
+  AddRow(1, 5, 0, 4, parts);
   EXPECT_TRUE(df->VDiscount());
-  EXPECT_EQ(Dbl(rows->Field("Amount")), 36);
-  EXPECT_EQ(Dbl(rows->Field("Price")), 36);
+  EXPECT_EQ(Field(rows, "Amount"), 36);
   parts->MoveFirst();
-  EXPECT_EQ(Dbl(parts->Field("Amount")), 18);
-  EXPECT_EQ(parts->Field("@DiscountOK"), Variant(true));
+  EXPECT_EQ(Field(parts, "Amount"), 18);
 }
 
-// Components an assembly consumes keep their amount (their cost), the product does not.
+// Components an assembly consumes keep their amount (their cost); the product does not.
 TEST_P(PricesTest, DiscountInAnAssembly) {
   Open("DDProduction");
-  AddRow(1, 2);
-  SetPrices(50, 100, 2);
-  rows->SetField("IDSenderStore", Variant(1));
+  AddRow(1, 50, 100, 2);
   rows->SetField("@Discount", Variant(10));
+  rows->SetField("IDSenderStore", Variant(1));
   df->VDiscount();
-  EXPECT_EQ(Dbl(rows->Field("Amount")), 100);
+  EXPECT_EQ(Field(rows, "Amount"), 100);
   rows->SetField("IDSenderStore", Variant::Null());
   df->VDiscount();
-  EXPECT_EQ(Dbl(rows->Field("Amount")), 90);
+  EXPECT_EQ(Field(rows, "Amount"), 90);
 }
 
+// Rows: a plain row (list price 100 × 2, article category 1 with the company's category 7: cut
+// -5 %), a row without a list price, and a "D" set whose two particulars hold 30 and 20.
 TEST_P(PricesTest, PercentCommands) {
   struct Row {
     bool priceList, confirm;
-    Variant percent;
-    double plain, setRow, part1, part2, noPrice;
+    double percent, plain, noPrice, setRow, part1, part2;
     const char* box;
   } cases[] = {
-      {false, false, Variant(-10), 100, 50, 30, 20, 40, "InputBox(\"Amount discount\")->False"},
-      {false, true, Variant(-10), 90, 45, 27, 18, 36, "InputBox(\"Amount discount\")->True"},
-      {false, true, Variant("12.5"), 112.5, 56.25, 33.75, 22.5, 45, "InputBox(\"Amount discount\")->True"},
-      // From the list price 100 × 2 with the category cut -5 % and +10 %: 209.
-      {true, true, Variant(10), 209, 44, 22, 22, 40, "InputBox(\"Pricelist discount\")->True"},
+      {false, false, -10, 100, 40, 50, 30, 20, "InputBox(\"Amount discount\")->False"},
+      {false, true, -10, 90, 36, 45, 27, 18, "InputBox(\"Amount discount\")->True"},
+      {false, true, 12.5, 112.5, 45, 56.25, 33.75, 22.5, "InputBox(\"Amount discount\")->True"},
+      {true, true, 10, 209, 40, 44, 22, 22, "InputBox(\"Pricelist discount\")->True"},  // 100 × 2 × 0.95 × 1.1
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.box);
     Exec("DELETE FROM SDInvoiceRow");  // rows the last case wrote back
     Open();
-    header->SetField("IDGRCompany", Variant(102));  // price category 7
-    AddRow(1, 2);                                   // article category 1: cut -5 %
-    SetPrices(100, 100, 2);
-    AddRow(7, 2);
-    SetPrices(0, 40, 2);  // no list price
-    AddRow(7, 1);
+    header->SetField("IDGRCompany", Variant(102));
+    AddRow(1, 100, 100, 2);
+    AddRow(7, 0, 40, 2);
+    AddRow(7, 0, 50, 1);
     rows->SetField("CompletionType", Variant("D"));
-    rows->SetField("Amount", Variant(50));
     Ref<DataObject> parts = session->Proxy()->CachedRows("SDInvoiceRow", "Next");
-    for (double a : {30.0, 20.0}) {
-      parts->AddNew();
-      parts->SetField("Amount", Variant(a));
-      parts->SetField("UnitPrice", Variant(10));
-      parts->SetField("BaseQuantity", Variant(2));
-    }
+    AddRow(0, 10, 30, 2, parts);
+    AddRow(0, 10, 20, 2, parts);
     std::string entry;
     session->Policy().inputBox = [&](ParamList& p, const std::string&) {
       entry = p.NameAt(1) + "=" + CStr(p.Item(p.NameAt(1)));
-      p.Set("Percent", c.percent);
+      p.Set("Percent", Variant(c.percent));
       return c.confirm;
     };
     session->ClearTranscript();
     EXPECT_EQ(c.priceList ? df->ComputePercentPricelist() : df->ComputePercentAmount(), c.confirm);
     EXPECT_EQ(entry, "Percent=0");
-    EXPECT_EQ(MsgBoxes(), std::vector<std::string>{c.box});
-    rows->MoveFirst();
-    EXPECT_EQ(Dbl(rows->Field("Amount")), c.plain);
-    EXPECT_EQ(Dbl(rows->Field("Price")), c.plain / 2);
-    if (c.confirm) {
-      EXPECT_EQ(rows->Field("StatAmount"), rows->Field("Amount"));
-    }
-    rows->MoveNext();
-    EXPECT_EQ(Dbl(rows->Field("Amount")), c.noPrice);
-    rows->MoveNext();
-    EXPECT_EQ(Dbl(rows->Field("Amount")), c.setRow);
-    parts = session->Proxy()->CachedRows("SDInvoiceRow", "Next");
-    parts->MoveFirst();
-    EXPECT_EQ(Dbl(parts->Field("Amount")), c.part1);
-    parts->MoveNext();
-    EXPECT_EQ(Dbl(parts->Field("Amount")), c.part2);
+    EXPECT_EQ(Boxes(), std::vector<std::string>{c.box});
     EXPECT_EQ(Transcribed("RefreshBrowser(\"\")"), c.confirm);
+    rows->MoveFirst();
+    EXPECT_EQ(Field(rows, "Amount"), c.plain);
+    EXPECT_EQ(Field(rows, "Price"), c.plain / 2);
+    EXPECT_EQ(Field(rows, "StatAmount"), c.confirm ? c.plain : 0);
+    rows->MoveNext();
+    EXPECT_EQ(Field(rows, "Amount"), c.noPrice);
+    rows->MoveNext();
+    EXPECT_EQ(Field(rows, "Amount"), c.setRow);
+    parts->MoveFirst();
+    EXPECT_EQ(Field(parts, "Amount"), c.part1);
+    parts->MoveNext();
+    EXPECT_EQ(Field(parts, "Amount"), c.part2);
     session->Close();
   }
 }
