@@ -182,6 +182,7 @@ class IXALCallback : public Object {
 
 // Message-box buttons (added together) and answers.
 constexpr int32_t kMbOK = 0;
+constexpr int32_t kMbOKCancel = 1;
 constexpr int32_t kMbYesNo = 4;
 constexpr int32_t kMbButtonsMask = 7;      // the buttons part of a Buttons value
 constexpr int32_t kMbDefaultSecond = 256;  // the second button is preselected

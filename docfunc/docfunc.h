@@ -245,6 +245,26 @@ class DocFunc : public Object {
   void SpreadSetCost(xal::DataObject& row);
   bool CheckLotQuantities(xal::DataObject& row);
 
+  // ---- Prices (prices.cpp) ----------------------------------------------------------------------
+  // The price look-up for an article: fills CompanyPriceRow, PriceListRow and the look-up flags.
+  void LookUpPrice(int32_t article);
+  Date PriceDate();
+  Ref<xal::DataObject> CompanyPrice(int32_t article, int32_t company, Date date);
+  int32_t OrdinaryPriceList(int32_t article);
+  // The first price row valid on `date` in the chain from `list`; nullptr when there is none.
+  Ref<xal::DataObject> PriceRowInChain(int32_t article, int32_t list, Date date);
+  int32_t PriceListOnDate(int32_t list, Date date, int32_t& next);
+  // How many of the article's unit one price unit holds.
+  double UnitFactor(int32_t articleUnit, int32_t priceUnit);
+  void FillCompanyPrice(xal::DataObject& row);
+  void FillListPrice(xal::DataObject& row);
+  bool KeepsAmount(xal::DataObject& row);
+  void DiscountRow(Ref<xal::DataObject>& row);
+  void RederivePrice(xal::DataObject& row);
+  bool ComputePercent(int32_t title, bool fromPriceList);
+  void ChangeByPercent(xal::DataObject& row, double factor, bool fromPriceList);
+  double CategoryCut(xal::DataObject& row);
+
   DocState st_;
 };
 

@@ -309,10 +309,11 @@ Ref<DataObject> HostServer::OpenQuery(const std::string& sqlOrTable, int32_t, co
   }
   std::string sql = c->Translate(source);
   if (!Trim(filter).empty()) sql = "SELECT * FROM (" + sql + ") WHERE " + c->Translate(FilterCondition("", filter));
-  // A query over one table can still write its rows back to that table.
-  ResultSet probe = c->db().Query("SELECT * FROM (" + sql + ") WHERE 0");
-  std::string table = probe.sourceTable;
-  return c->OpenRows(sql, table, table.empty() ? "" : c->BaseTable(table));
+  // A query whose columns all come from one table can still write its rows back to that table;
+  // the result itself names the table, so the query runs once.
+  ResultSet rs = c->db().Query(sql);
+  const std::string table = rs.sourceTable;
+  return MakeRef<HostDataObject>(c, table, table.empty() ? "" : c->BaseTable(table), std::move(rs));
 }
 
 Ref<DataObject> HostServer::OpenDataObject(const std::string& table) {

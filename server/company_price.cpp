@@ -36,37 +36,15 @@ struct Customer {
 int32_t OrdinaryList(const Checked<XALServer>& server, int32_t article, const Customer& c) {
   if (c.list != 0) return c.list;
   if (c.companyCat == 0) return 0;
-  const Checked<DataObject> rs = server->OpenQuery(
-      "SELECT A.IDGRPriceList FROM GRPriceCatRel A, GRArticle B WHERE B.ID = " + Num(article) +
-          " AND B.IDGRArticlePriceCat = A.IDGRArticlePriceCat AND A.IDGRCompanyPriceCat = " + Num(c.companyCat),
-      kQueryReadOnly, "", "");
-  if (rs->IsEOF()) return 0;
-  return IdField(rs, "IDGRPriceList");
+  return CategoryPriceList(server, article, c.companyCat);
 }
 
-// The newest price row of `list` that covers `date` (an EndDate before 1900 is open); false when
-// none does.
+// The price of the row of `list` valid on `date`; false when none qualifies.
 bool ValidPriceRow(const Checked<XALServer>& server, int32_t article, int32_t list, Date date, Currency& price) {
-  const Checked<DataObject> rs = server->OpenQuery("SELECT * FROM GRPriceListRel WHERE IDGRArticle = " + Num(article) +
-                                             " AND IDGRPriceList = " + Num(list) + " ORDER BY BeginDate DESC, EndDate",
-                                         kQueryEditable, "", "");
-  for (; !rs->IsEOF(); rs->MoveNext()) {
-    const double begin = DateField(rs, "BeginDate");
-    const double end = DateField(rs, "EndDate");
-    if (begin <= date.serial && (end >= date.serial || Year(Date(end)) < 1900)) {
-      price = ValueOr(rs->Field("Price"), Currency());
-      return true;
-    }
-  }
-  return false;
-}
-
-// The next list of `list`'s chain, 0 at the end (or when the list does not exist).
-int32_t NextList(const Checked<XALServer>& server, int32_t list) {
-  const Checked<DataObject> rs =
-      server->OpenQuery("SELECT IDFirst, IsBruto, WithoutPriceCut FROM GRPriceList WHERE ID = " + Num(list), kQueryEditable,
-                        "", "");
-  return rs->IsEOF() ? 0 : IdField(rs, "IDFirst");
+  Ref<DataObject> rs = PriceRowOnDate(server, article, list, date);
+  if (!rs) return false;
+  price = ValueOr(rs->Field("Price"), Currency());
+  return true;
 }
 
 // The price-category markup for the list the price was found in, when the pair has one.
@@ -82,12 +60,51 @@ Currency WithPriceCut(const Checked<XALServer>& server, Currency price, const Cu
 
 }  // namespace
 
+int32_t CategoryPriceList(const Checked<XALServer>& server, int32_t article, int32_t companyCategory) {
+  const Checked<DataObject> rs = server->OpenQuery(
+      "SELECT A.IDGRPriceList FROM GRPriceCatRel A, GRArticle B WHERE B.ID = " + Num(article) +
+          " AND B.IDGRArticlePriceCat = A.IDGRArticlePriceCat AND A.IDGRCompanyPriceCat = " + Num(companyCategory),
+      kQueryReadOnly, "", "");
+  return rs->IsEOF() ? 0 : IdField(rs, "IDGRPriceList");
+}
+
+PriceListInfo ReadPriceList(const Checked<XALServer>& server, int32_t list) {
+  const Checked<DataObject> rs = server->OpenQuery(
+      "SELECT IDFirst, IsBruto, WithoutPriceCut FROM GRPriceList WHERE ID = " + Num(list), kQueryEditable, "", "");
+  PriceListInfo info;
+  if (rs->IsEOF()) return info;
+  info.exists = true;
+  info.next = IdField(rs, "IDFirst");
+  info.gross = IdField(rs, "IsBruto") != 0;
+  info.noCut = IdField(rs, "WithoutPriceCut") != 0;
+  return info;
+}
+
+Ref<DataObject> PriceRowOnDate(const Checked<XALServer>& server, int32_t article, int32_t list, Date date) {
+  const Checked<DataObject> rs = server->OpenQuery("SELECT * FROM GRPriceListRel WHERE IDGRArticle = " + Num(article) +
+                                                        " AND IDGRPriceList = " + Num(list) +
+                                                        " ORDER BY BeginDate DESC, EndDate",
+                                                    kQueryEditable, "", "");
+  for (; !rs->IsEOF(); rs->MoveNext()) {
+    const double begin = DateField(rs, "BeginDate");
+    const double end = DateField(rs, "EndDate");
+    if (begin <= date.serial && (end >= date.serial || Year(Date(end)) < 1900)) return rs.get();
+  }
+  return nullptr;
+}
+
 // Walks the chain from `priceList` to the first list valid on the day of `date` (an EndDate of 0
 // is open). A date before day 1 or no list returns the list as given; a chain that runs out, or
 // comes back to a list already seen, returns 0.
-int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t priceList) {
+int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t priceList, int32_t* next) {
+  int32_t unused = 0;
+  int32_t& after = next ? *next : unused;
+  after = 0;
   const double t = std::floor(date.serial);
-  if (t < 1 || priceList == 0) return priceList;
+  if (t < 1 || priceList == 0) {
+    if (next && priceList != 0) after = ReadPriceList(Checked<XALConnect>(conn)->Server(), priceList).next;
+    return priceList;
+  }
   const Checked<XALServer> server = Checked<XALConnect>(conn)->Server();
   std::unordered_set<int32_t> seen;
   int32_t list = priceList;
@@ -98,8 +115,12 @@ int32_t FindValidPriceList(const Ref<XALConnect>& conn, Date date, int32_t price
     if (rs->IsEOF()) return 0;
     const double b = std::floor(DateField(rs, "BeginDate"));
     const double e = std::floor(DateField(rs, "EndDate"));
-    if (t >= b && (t <= e || e == 0)) return list;
-    list = IdField(rs, "IDFirst");
+    const int32_t first = IdField(rs, "IDFirst");
+    if (t >= b && (t <= e || e == 0)) {
+      after = first;
+      return list;
+    }
+    list = first;
     if (list == 0) return 0;
   }
   return 0;
@@ -136,7 +157,7 @@ Currency GetCompanyPrice(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticl
     const bool cycled = !walked.insert(list).second;
     found = !cycled && ValidPriceRow(server, pIDGRArticle, list, date, price);
     if (!found && !cycled) {
-      const int32_t next = NextList(server, list);
+      const int32_t next = ReadPriceList(server, list).next;
       if (next != 0) {
         list = next;
         continue;
@@ -144,9 +165,12 @@ Currency GetCompanyPrice(const Ref<XALConnect>& pXALConnect, int32_t pIDGRArticl
     }
     if (!cycled) {
       // A list that is itself out of date gives way to the first valid list of its chain.
+      // A price found in a list that is out of date, with no valid list after it, is no price;
+      // a company-specific list then still hands over to the ordinary list below.
       const int32_t valid = FindValidPriceList(pXALConnect, date, list);
-      if (valid == 0) return Currency();
-      if (valid != list) {
+      if (valid == 0) {
+        found = false;
+      } else if (valid != list) {
         list = valid;
         continue;
       }

@@ -23,7 +23,8 @@ std::string Serial(int y, int m, int d) { return std::to_string(static_cast<int>
 // date; 79 out of date at the end of its chain; 80 -> 81 -> 80 a cycle whose second list is out
 // of date and whose first has a price.
 // Companies: 1 list 71; 2 own list 70 (then 71) and category 5; 3 category 5 only; 4 list 73;
-// 5 list 74; 6 nothing; 7 own list 74 (then 71); 8 list 71 and category 5; 9 list 80.
+// 5 list 74; 6 nothing; 7 own list 74 (then 71); 8 list 71 and category 5; 9 list 80; 10 own
+// list 79 (then 71).
 // Articles: 100 category 8, 101 no category, 102 category 9.
 class CompanyPriceTest : public DialectDbTest {
  protected:
@@ -37,7 +38,8 @@ class CompanyPriceTest : public DialectDbTest {
          "), (81, 80, 0, 0);"
          "INSERT INTO GRCompany (ID, Code, IDGRPriceList, IDGRPriceListC, IDGRCompanyPriceCat) VALUES"
          " (1, 'C1', 71, 0, 0), (2, 'C2', 71, 70, 5), (3, 'C3', 0, 0, 5), (4, 'C4', 73, 0, 0), (5, 'C5', 74, 0, 0),"
-         " (6, 'C6', 0, 0, 0), (7, 'C7', 71, 74, 0), (8, 'C8', 71, 0, 5), (9, 'C9', 80, 0, 0);"
+         " (6, 'C6', 0, 0, 0), (7, 'C7', 71, 74, 0), (8, 'C8', 71, 0, 5), (9, 'C9', 80, 0, 0),"
+         " (10, 'C10', 71, 79, 0);"
          "INSERT INTO GRArticle (ID, Code, IDGRArticlePriceCat) VALUES (100, 'A', 8), (101, 'B', 0), (102, 'C', 9);"
          "INSERT INTO GRPriceCatRel (IDGRArticlePriceCat, IDGRCompanyPriceCat, IDGRPriceList, PriceCut) VALUES"
          " (8, 5, 76, -10), (9, 5, 76, 25);"
@@ -46,7 +48,7 @@ class CompanyPriceTest : public DialectDbTest {
          " (71, 100, 110, " + Serial(2009, 6, 1) + ", " + Serial(2009, 6, 30) + "),"
          " (71, 100, 120, " + Serial(2009, 3, 1) + ", " + Serial(2009, 3, 31) + "),"
          " (72, 100, 60, 0, 0), (72, 101, 50, 0, 0), (73, 100, 999, 0, 0), (70, 100, 80, 0, 0),"
-         " (76, 100, 200, 0, 0), (76, 102, 0.1, 0, 0), (80, 100, 40, 0, 0);");
+         " (76, 100, 200, 0, 0), (76, 102, 0.1, 0, 0), (80, 100, 40, 0, 0), (79, 100, 777, 0, 0);");
   }
 };
 
@@ -76,6 +78,9 @@ TEST_P(CompanyPriceTest, Prices) {
       {100, 5, D(2009, 3, 15), 0, "a cycle without prices ends"},
       {100, 7, D(2009, 3, 15), 120, "an own list in a cycle ends, then the ordinary list"},
       {100, 9, D(2009, 3, 15), 0, "a cycle back to a list out of date ends"},
+      {100, 10, D(2010, 1, 15), 777, "the own list within its dates"},
+      {100, 10, D(2009, 3, 15), 120, "own list out of date, no valid list after it: the ordinary list"},
+      {101, 10, D(2009, 3, 15), 50, "the same without a row in the own list"},
       {100, 6, D(2009, 3, 15), 0, "no list and no category"},
       {100, 99, D(2009, 3, 15), 0, "no such company"},
       {999, 1, D(2009, 3, 15), 0, "no such article"},
