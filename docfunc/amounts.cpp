@@ -59,6 +59,14 @@ bool DocFunc::DoHeaderRefresh() {
 // any other row in full as asked. On documents with sets each row's set is to be refilled.
 bool DocFunc::RecomputeRows(bool Full) {
   Ref<DataObject> rows = st_.RowOB.get();
+  struct PairValuesKept {  // for this run only: the pairs may change between two commands
+    DocState& st;
+    explicit PairValuesKept(DocState& s) : st(s) { st.KeepPairValues = true; }
+    ~PairValuesKept() {
+      st.KeepPairValues = false;
+      st.PairValues.clear();
+    }
+  } kept(st_);
   docfunc::WalkRows(Require(rows), [&] {
     if (CompletionType(*rows) == "D") {
       ForEachPart([&](Ref<DataObject>& part) { RecomputeRow(part, Full); });
@@ -123,11 +131,15 @@ Variant DocFunc::CategoryPairValue(DataObject& row, const std::string& column) {
   if (articleCat == 0 || priceList == 0) return Variant();
   auto pair = [&](int32_t companyCat) -> Variant {
     if (companyCat == 0) return Variant();
+    const std::string condition = "A.IDGRArticlePriceCat = " + std::to_string(articleCat) +
+                                  " AND A.IDGRCompanyPriceCat = " + std::to_string(companyCat) +
+                                  " AND A.IDGRPriceList = " + std::to_string(priceList);
+    if (auto kept = st_.PairValues.find(column + " " + condition); kept != st_.PairValues.end()) return kept->second;
     const Ref<DataObject> found =
-        OpenQuery("SELECT A." + column + " AS " + column + " FROM GRPriceCatRel A WHERE A.IDGRArticlePriceCat = " +
-                  std::to_string(articleCat) + " AND A.IDGRCompanyPriceCat = " + std::to_string(companyCat) +
-                  " AND A.IDGRPriceList = " + std::to_string(priceList));
-    return found->IsEOF() ? Variant() : found->Field(column);
+        OpenQuery("SELECT A." + column + " AS " + column + " FROM GRPriceCatRel A WHERE " + condition);
+    const Variant value = found->IsEOF() ? Variant() : found->Field(column);
+    if (st_.KeepPairValues) st_.PairValues.emplace(column + " " + condition, value);
+    return value;
   };
   const Variant value = pair(LongOf(header.Field("GRCompany.IDGRCompanyPriceCat" + st_.CompanyFieldSuffix)));
   const int32_t partner = LongOf(header.Field("IDPartner"));

@@ -83,7 +83,7 @@ bool DocFunc::VQuantity() {
     DataObject& row = Require(rows);
     st_.OldAmount = CurrencyOf(row.Field("Amount"));
     if (st_.RoundingQuantity >= 0)
-      row.SetField("Quantity", Variant(CDbl(server::Round(row.Field("Quantity"), st_.RoundingQuantity))));
+      row.SetField("Quantity", Variant(CDbl(server::Round(Variant(DoubleOf(row.Field("Quantity"))), st_.RoundingQuantity))));
     const double base =
         UnitToBase(DoubleOf(row.Field("Quantity")), LongOf(row.Field("IDGRUnit")), LongOf(row.Field(st_.UnitField)));
     row.SetField("BaseQuantity", Variant(base));

@@ -7,6 +7,7 @@
 #pragma once
 
 #include <cstdint>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -97,6 +98,10 @@ struct DocState {
 
   bool HasQuantityPrices = false, TwoStores = false;
   bool TotalsReady = false, RowTaxEntered = false;
+  // Values of price-category pairs looked up while RecomputeRows runs, by column, article
+  // category, company category and price list: a document of many rows asks for few pairs.
+  std::map<std::string, Variant> PairValues;
+  bool KeepPairValues = false;
 
   // ---- Bookkeeping of the handler template ------------------------------------------------------
   ObjectRef Evaluator;  // the expression evaluator, created on first use
