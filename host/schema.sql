@@ -937,26 +937,3 @@ CREATE TRIGGER DRStockReserveRel_au AFTER UPDATE OF IDDRStockReserve, IDDDStoreD
   INSERT INTO DCurDRStockReserveDelta SELECT NEW.IDDRStockReserve, NEW.Quantity, IDGRArticle, IDReceiverStore,
     IDSenderStore, DealState, 1 FROM DDStoreDRow WHERE ID = NEW.IDDDStoreDRow;
 END;
-
--- ---------------------------------------------------------------------------------------------
--- Columns the header validations fill: the accounts and foreign-trade terms a company brings,
--- and the row fields that take the company, the department and the registers. Added here apart
--- until the tables above list them in place.
--- ---------------------------------------------------------------------------------------------
-ALTER TABLE GDocument ADD COLUMN IDBRAccount INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GDocument ADD COLUMN IDPurchaseAccount INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GDocument ADD COLUMN IDDebtAccount INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GDocument ADD COLUMN IDDRIntrTermDelivery INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GDocument ADD COLUMN IDDRIntrTransport INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GDocument ADD COLUMN IDDRIntrCustomsProc INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GRCompany ADD COLUMN Country TEXT COLLATE NOCASE NOT NULL DEFAULT '';
-ALTER TABLE GRCompany ADD COLUMN DeliveryLocation TEXT COLLATE NOCASE NOT NULL DEFAULT '';
-ALTER TABLE GRCompany ADD COLUMN IDDRIntrTermDelivery INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GRCompany ADD COLUMN IDDRIntrTransport INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE GRCompany ADD COLUMN IDDRIntrCustomsProc INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE SDInvoiceRow ADD COLUMN IDGRCompany INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE SDInvoiceRow ADD COLUMN IDGRDepartment INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE SDInvoiceRow ADD COLUMN IDGARegister2 INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE SDInvoiceRow ADD COLUMN IDGBRegister4 INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE CADocRow ADD COLUMN IDSenderDepartment INTEGER NOT NULL DEFAULT 0;
-ALTER TABLE CADocRow ADD COLUMN IDReceiverDepartment INTEGER NOT NULL DEFAULT 0;
