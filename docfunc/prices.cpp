@@ -310,12 +310,14 @@ int32_t DocFunc::PriceListOnDate(int32_t list, Date date, int32_t& next) {
 //   4. Otherwise the discounted price is Round(unit price × (1 − discount / 100), 4) and the
 //      amount Round(price × "BaseQuantity", 2). The cuts do not apply on top: the discount is
 //      measured from the list's unit price, as VAmount measures it, so the two agree.
-//   5. Each row touched gets its price re-derived, "StatAmount" and "@DiscountOK"; the full
-//      totals and the row refresh follow.
+//   5. Each row touched gets its price re-derived, "StatAmount" and "@DiscountOK"; the totals
+//      follow incrementally from the amount before the discount (a full pass would reset every
+//      row's "@DiscountOK" again) and the row is refreshed.
 bool DocFunc::VDiscount() {
   return Handle("VDiscount", [&](bool& result) {
     Ref<DataObject> row = st_.RowOB.get();
     Require(row);
+    st_.OldAmount = docfunc::CurrencyOf(row->Field("Amount"));
     Ref<DataObject> parts;
     if (TextEquals(TrimmedOf(row->Field(st_.CompletionTypeField)), "D"))
       parts = st_.Doc->CachedRows(st_.RowTable, "Next");
@@ -332,7 +334,7 @@ bool DocFunc::VDiscount() {
     } else {
       DiscountRow(row);
     }
-    st_.FullTotalsPending = st_.RowRefreshPending = true;
+    st_.TotalsPending = st_.RowRefreshPending = true;
     result = true;
   });
 }

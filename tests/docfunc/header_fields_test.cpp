@@ -152,16 +152,17 @@ class RegisterQuestion : public HeaderFields {
 
 TEST_F(RegisterQuestion, OptionOrAnswerDecidesAndSetsChangeWithTheirComponents) {
   const std::string kAsk = "MsgBox(\"Replace departments on document rows?\",4)->";
+  const std::string kParts = "CachedRows(\"SDINVOICERow\",\"Next\"); ";  // the set row's components
   struct Case {
     const char* option;
     int32_t answer;
     int32_t rowsChanged;
     std::string transcript;
   } cases[] = {
-      {"AlwaysYes", 0, 4, "RefreshBrowser(\"\")"},
+      {"AlwaysYes", 0, 4, kParts + "RefreshBrowser(\"\")"},
       {" alwaysno ", 0, 0, ""},
       {"", 7, 0, kAsk + "7"},
-      {"", 6, 4, kAsk + "6; RefreshBrowser(\"\")"},
+      {"", 6, 4, kAsk + "6; " + kParts + "RefreshBrowser(\"\")"},
   };
   for (const Case& c : cases) {
     SCOPED_TRACE(c.option);

@@ -69,7 +69,7 @@ TEST_F(Lifecycle, NewDocumentTakesTheUsersDefaults) {
   // The company is validated as if entered: it clears the status line and shows its panel.
   EXPECT_EQ(session->TranscriptText(),
             "StatusMsg(\"\"); StatusMsg(\"Missing doc. series\"); StatusMsg(\"\"); CmdPost(\"ShowGRCompanyInfo\"); "
-            "RefreshHeader(\"\")");
+            "RefreshHeader(\"@\"); RefreshHeader(\"TotalAmount\"); RefreshHeader(\"\")");
   EXPECT_TRUE(State().NewDocument);
   EXPECT_FALSE(State().NewDocPending);
   EXPECT_EQ(State().RowOB.get(), session->Rows());

@@ -53,7 +53,8 @@ TEST(SimulatedUser, WithoutAFormEveryLookUpIsNothing) {
   EXPECT_EQ(setting, Variant(3));
   user->GetSettings("Other", Variant(1), setting);
   EXPECT_EQ(setting, Variant(1));
-  EXPECT_EQ(user->TranscriptText(), "GetObject(\"DocData\")->Nothing");
+  // Lines come from the transcript sink that Attach connects; calls made straight on the user write none.
+  EXPECT_TRUE(user->Transcript().empty());
 }
 
 TEST(QuoteName, EveryNameStaysOneIdentifier) {
