@@ -343,9 +343,8 @@ bool DocFunc::CompanyMessageBlocks() {
   return true;
 }
 
-// The save-time check: pre-reservations where they are not allowed, stock on hand, and blocking
-// company messages. The credit-limit check and the lot check join with the handlers that bring
-// them.
+// The save-time check: pre-reservations where they are not allowed, the credit limit, stock on
+// hand, and blocking company messages. The lot check joins with the reservation handlers.
 bool DocFunc::Doc_Valid() {
   return Handle("Doc_Valid", [&](bool& result) {
     result = true;
@@ -356,6 +355,7 @@ bool DocFunc::Doc_Valid() {
       result = false;
       return;
     }
+    result = VerifyCreditLimit(1);  // asking mode: the user may save over the limit
     Status("");
     if (result && st_.IsStockDoc && st_.CheckStockReserve && !preReservation) result = CheckOnHand();
     if (st_.UseCompanyMessage && CompanyMessageBlocks()) result = false;

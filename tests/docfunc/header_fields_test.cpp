@@ -427,6 +427,13 @@ TEST_F(HeaderFields, CreditLimitWarnsAndAsksWithTheRealFigures) {
       EXPECT_EQ(Scalar("SELECT LogText FROM XALLog WHERE Kind = '2' AND TableName = 'SDOrder' AND IDRecord = 2003"),
                 c.answer == 6 ? Variant(text) : Variant::Null());
     }
+    // Saving asks the same question: No stops the save, Yes lets it go on.
+    for (int32_t answer : {kAnswerNo, kAnswerYes}) {
+      Open("SDInvoice", 2000);
+      SetHeader({{"IDGRCompany", Variant(10)}, {"TotalAmount", Variant(7000.0)}, {"ExchangeRate", Variant(0.0)}});
+      session->AddMsgBoxAnswer(answer);
+      EXPECT_EQ(Handler("Doc_Valid"), Variant(answer == kAnswerYes));
+    }
   }
 }
 
