@@ -65,6 +65,7 @@ bool DocFunc::RecomputeRows(bool Full) {
     ~PairValuesKept() {
       st.KeepPairValues = false;
       st.PairValues.clear();
+      st.PriceLookUps.clear();
     }
   } kept(st_);
   docfunc::WalkRows(Require(rows), [&] {

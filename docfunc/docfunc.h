@@ -247,6 +247,7 @@ class DocFunc : public Object {
 
   // ---- Prices (prices.cpp) ----------------------------------------------------------------------
   // The price look-up for an article: fills CompanyPriceRow, PriceListRow and the look-up flags.
+  void LookUpPriceOnce(int32_t article);
   void LookUpPrice(int32_t article);
   Date PriceDate();
   Ref<xal::DataObject> CompanyPrice(int32_t article, int32_t company, Date date);

@@ -122,13 +122,33 @@ bool DocFunc::FillPrice(Ref<xal::DataObject>& pRowOB) {
     row.SetField(st_.PriceListIDField, Variant(int32_t{0}));
     row.SetField(st_.CPriceListField, Variant(int32_t{0}));
     st_.QuantityPriceUsed = false;
-    LookUpPrice(LongOf(row.Field(st_.ArticleField)));
+    LookUpPriceOnce(LongOf(row.Field(st_.ArticleField)));
     if (HasRow(st_.CompanyPriceRow))
       FillCompanyPrice(row);
     else if (HasRow(st_.PriceListRow))
       FillListPrice(row);
     result = true;
   });
+}
+
+// The price look-up, taken from the run's cache while RecomputeRows keeps one (the result rows
+// are only read, never moved, so one pair of them serves every row of the article).
+void DocFunc::LookUpPriceOnce(int32_t article) {
+  if (!st_.KeepPairValues) return LookUpPrice(article);
+  auto found = st_.PriceLookUps.find(article);
+  if (found == st_.PriceLookUps.end()) {
+    LookUpPrice(article);
+    st_.PriceLookUps[article] = {st_.CompanyPriceRow, st_.PriceListRow, st_.CompanyPriceFound, st_.CompanyListUsed,
+                                 st_.PriceIsGross, st_.PriceNoCut};
+    return;
+  }
+  const DocState::PriceLookUp& kept = found->second;
+  st_.CompanyPriceRow = kept.companyRow;
+  st_.PriceListRow = kept.listRow;
+  st_.CompanyPriceFound = kept.companyFound;
+  st_.CompanyListUsed = kept.companyListUsed;
+  st_.PriceIsGross = kept.gross;
+  st_.PriceNoCut = kept.noCut;
 }
 
 void DocFunc::FillCompanyPrice(DataObject& row) {

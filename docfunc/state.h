@@ -102,6 +102,13 @@ struct DocState {
   // category, company category and price list: a document of many rows asks for few pairs.
   std::map<std::string, Variant> PairValues;
   bool KeepPairValues = false;
+  // The price look-up of each article while RecomputeRows runs: the header (company, partner,
+  // list, date) does not change during the run, so the look-up depends on the article alone.
+  struct PriceLookUp {
+    Ref<DataObject> companyRow, listRow;
+    bool companyFound = false, companyListUsed = false, gross = false, noCut = false;
+  };
+  std::map<int32_t, PriceLookUp> PriceLookUps;
 
   // ---- Bookkeeping of the handler template ------------------------------------------------------
   ObjectRef Evaluator;  // the expression evaluator, created on first use
