@@ -43,9 +43,12 @@ std::string Joined(const std::vector<int32_t>& ids) {
   return out;
 }
 
+// A switch of the computation: not given (Empty, Null or an empty text, as a form leaves an unset
+// parameter) means its default.
 bool Switch(const Ref<ParamList>& params, const char* name, bool byDefault) {
   const Variant v = params ? params->Item(name) : Variant();
-  return v.IsEmpty() || v.IsNull() ? byDefault : CBool(v);
+  if (v.IsEmpty() || v.IsNull() || (v.IsString() && Trim(v.AsString()).empty())) return byDefault;
+  return CBool(v);
 }
 
 // Steps 2 to 5 as one statement: ?1 the header, ?2 ReservedD, ?3 CountPreReservations,
