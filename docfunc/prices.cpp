@@ -8,6 +8,7 @@
 
 #include "collections/ui_strings.h"
 #include "docfunc/handler.h"
+#include "docfunc/internal/rows.h"
 #include "docfunc/values.h"
 #include "runtime/dates.h"
 #include "runtime/text.h"
@@ -25,34 +26,12 @@ using docfunc::TrimmedOf;
 
 namespace {
 
-std::string Num(int32_t v) { return std::to_string(v); }
+using server::Num;
 
 // Every price and amount is written rounded (4 decimals for prices, 2 for amounts) as currency.
-Variant Money(double value, int16_t places) { return Variant(CCur(server::Round(Variant(value), places))); }
+Variant Money(double value, int16_t places) { return Variant(docfunc::RoundedMoney(value, places)); }
 
 bool HasRow(const Ref<DataObject>& rs) { return rs && !rs->IsEOF(); }
-
-// The factor that turns a quantity of `unit` into the first unit of its chain (each unit names
-// its first unit, IDFirst, and how many of it it holds, Relation); `first` is that unit, 0 when
-// a unit is missing or the chain comes back on itself.
-double UnitInFirst(XALServer& server, int32_t unit, int32_t& first) {
-  double factor = 1;
-  std::unordered_set<int32_t> seen;
-  first = 0;
-  while (seen.insert(unit).second) {
-    Ref<DataObject> u = server.OpenQuery("SELECT ID, IDFirst, Relation FROM GRUnit WHERE ID = " + Num(unit),
-                                         kQueryReadOnly, "", "");
-    if (!HasRow(u)) return 0;
-    const int32_t next = LongOf(u->Field("IDFirst"));
-    if (next == 0) {
-      first = unit;
-      return factor;
-    }
-    factor *= DoubleOf(u->Field("Relation"));
-    unit = next;
-  }
-  return 0;
-}
 
 }  // namespace
 
@@ -188,19 +167,11 @@ void DocFunc::FillListPrice(DataObject& row) {
 }
 
 // The unit factor F: one price unit holds F of the article's unit, so a price per price unit
-// divided by F is the price per article unit.
-//   1. No unit on either side, or the same unit: 1.
-//   2. Both units are reduced to the first unit of their chains.
-//   3. The same first unit: F = (price unit in it) / (article unit in it).
-//   4. Units of different chains, a missing unit or a Relation of 0: 1, the price as it stands.
+// divided by F is the price per article unit. It is one price unit expressed in the article's
+// unit, through the same unit walk as the quantities (UnitToBase): units that cannot be converted
+// give 1, the price as it stands.
 double DocFunc::UnitFactor(int32_t articleUnit, int32_t priceUnit) {
-  if (articleUnit == 0 || priceUnit == 0 || articleUnit == priceUnit) return 1;
-  xal::XALServer& server = *st_.Server;
-  int32_t articleFirst = 0, priceFirst = 0;
-  const double a = UnitInFirst(server, articleUnit, articleFirst);
-  const double p = UnitInFirst(server, priceUnit, priceFirst);
-  if (articleFirst == 0 || articleFirst != priceFirst || a == 0 || p == 0) return 1;
-  return p / a;
+  return UnitToBase(1.0, priceUnit, articleUnit);
 }
 
 // ---------------------------------------------------------------------------------------------
