@@ -7,6 +7,7 @@
 #include <initializer_list>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "runtime/convert.h"
 #include "runtime/text.h"
@@ -15,12 +16,17 @@
 namespace xal::docfunc {
 
 inline bool IsBlank(const Variant& v) { return v.IsNull() || v.IsEmpty() || v.IsMissing(); }
-inline int32_t LongOf(const Variant& v) { return IsBlank(v) ? 0 : CLng(v); }
-inline double DoubleOf(const Variant& v) { return IsBlank(v) ? 0.0 : CDbl(v); }
-inline Currency CurrencyOf(const Variant& v) { return IsBlank(v) ? Currency() : CCur(v); }
-inline std::string TextOf(const Variant& v) { return IsBlank(v) ? std::string() : CStr(v); }
+// The runtime's ValueOr, with an omitted (Missing) value read as blank too.
+template <class T>
+T BlankOr(const Variant& v, T fallback) {
+  return v.IsMissing() ? fallback : ValueOr(v, std::move(fallback));
+}
+inline int32_t LongOf(const Variant& v) { return BlankOr(v, int32_t{0}); }
+inline double DoubleOf(const Variant& v) { return BlankOr(v, 0.0); }
+inline Currency CurrencyOf(const Variant& v) { return BlankOr(v, Currency()); }
+inline std::string TextOf(const Variant& v) { return BlankOr(v, std::string()); }
 inline std::string TrimmedOf(const Variant& v) { return Trim(TextOf(v)); }
-inline Date DateOf(const Variant& v) { return IsBlank(v) ? Date() : CDate(v); }
+inline Date DateOf(const Variant& v) { return BlankOr(v, Date()); }
 // An option or flag: True for a non-zero number, True or numeric text; "" and blanks are False.
 inline bool FlagOf(const Variant& v) {
   if (IsBlank(v)) return false;
